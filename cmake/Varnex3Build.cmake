@@ -1,0 +1,44 @@
+# How every target of the project is compiled: one place for the language level, warnings and sanitizers.
+set(CMAKE_CXX_STANDARD 20)
+set(CMAKE_CXX_STANDARD_REQUIRED ON)
+set(CMAKE_CXX_EXTENSIONS OFF)
+set(CMAKE_POSITION_INDEPENDENT_CODE ON) # the same objects go into the static and the shared library
+set(CMAKE_EXPORT_COMPILE_COMMANDS ON)
+if(NOT CMAKE_BUILD_TYPE AND NOT CMAKE_CONFIGURATION_TYPES)
+    set(CMAKE_BUILD_TYPE Release)
+endif()
+
+add_library(varnex3_build INTERFACE)
+target_include_directories(varnex3_build INTERFACE ${PROJECT_SOURCE_DIR})
+target_compile_options(varnex3_build INTERFACE
+    -Wall -Wextra -Wpedantic -Wconversion -Wsign-conversion -Wshadow -Wnon-virtual-dtor -Wold-style-cast
+    -Wcast-align -Woverloaded-virtual -Wnull-dereference)
+if(VARNEX3_WERROR)
+    target_compile_options(varnex3_build INTERFACE -Werror)
+endif()
+if(VARNEX3_SANITIZE)
+    add_compile_options(-fsanitize=address,undefined -fno-sanitize-recover=all -fno-omit-frame-pointer)
+    add_link_options(-fsanitize=address,undefined)
+endif()
+
+# A layer of the library: its objects, compiled with nothing but the layers below it on the link line, so that a
+# dependency that points up does not link.
+function(varnex3_layer name)
+    cmake_parse_arguments(ARG "" "" "SOURCES;USES" ${ARGN})
+    add_library(varnex3_${name} OBJECT ${ARG_SOURCES})
+    target_link_libraries(varnex3_${name} PRIVATE varnex3_build)
+    set_property(GLOBAL APPEND PROPERTY VARNEX3_LAYERS varnex3_${name})
+    set(objects varnex3_${name})
+    foreach(used IN LISTS ARG_USES)
+        get_property(below GLOBAL PROPERTY VARNEX3_OBJECTS_${used})
+        list(APPEND objects ${below})
+    endforeach()
+    list(REMOVE_DUPLICATES objects)
+    set_property(GLOBAL PROPERTY VARNEX3_OBJECTS_${name} ${objects})
+endfunction()
+
+# Links a program with one layer and what lies below it, and with nothing above it.
+function(varnex3_link_layer target layer)
+    get_property(objects GLOBAL PROPERTY VARNEX3_OBJECTS_${layer})
+    target_link_libraries(${target} PRIVATE varnex3_build ${objects})
+endfunction()

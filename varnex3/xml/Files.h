@@ -1,0 +1,24 @@
+// Whole files in and out, by the path names that hosts use.
+#pragma once
+
+#include <string>
+#include <string_view>
+
+namespace varnex3::xml {
+
+// A file name as the system has it, as 16-bit text. Bytes that are not UTF-8 become lone surrogates (0xDC80 + byte
+// - 0x80), so that NativePath gives the same name back.
+std::u16string FromNativePath(std::string_view native);
+
+// The inverse of FromNativePath: what the system's file functions take.
+std::string NativePath(std::u16string_view path);
+
+// The bytes of a file. Throws std::system_error with the system's reason (no such file, no permission, a folder).
+std::string ReadFile(std::u16string_view path);
+
+// Writes a file so that a reader, and a crash, sees either the old content or the new one: to a temporary file in
+// the same folder, then renamed over the target. Throws std::system_error; the old file then stays as it was and
+// nothing is left behind.
+void WriteFileAtomically(std::u16string_view path, std::string_view bytes);
+
+} // namespace varnex3::xml
