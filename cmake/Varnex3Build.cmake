@@ -11,8 +11,10 @@ endif()
 add_library(varnex3_build INTERFACE)
 target_include_directories(varnex3_build INTERFACE ${PROJECT_SOURCE_DIR})
 target_compile_options(varnex3_build INTERFACE
-    -Wall -Wextra -Wpedantic -Wconversion -Wsign-conversion -Wshadow -Wnon-virtual-dtor -Wold-style-cast
-    -Wcast-align -Woverloaded-virtual -Wnull-dereference)
+    -Wall -Wextra -Wpedantic -Wconversion -Wsign-conversion -Wnon-virtual-dtor -Wold-style-cast
+    -Wcast-align -Woverloaded-virtual
+    $<$<CXX_COMPILER_ID:GNU>:-Wshadow=local>
+    $<$<CXX_COMPILER_ID:Clang>:-Wshadow>)
 if(VARNEX3_WERROR)
     target_compile_options(varnex3_build INTERFACE -Werror)
 endif()

@@ -1,0 +1,110 @@
+// What every public class is: a reference-counted object on the heap that can describe its own interface.
+#pragma once
+
+#include <atomic>
+#include <concepts>
+#include <cstddef>
+#include <cstdint>
+#include <utility>
+
+namespace varnex3 {
+
+struct ClassInfo;
+
+// The base of every class. Records are made by New<T>(), live as long as somebody holds a Ref to them, and are used
+// by one thread at a time; the count alone is safe to change from several.
+class Record
+{
+public:
+    Record(const Record&) = delete;
+    Record& operator=(const Record&) = delete;
+
+    // The record's class: its name and its members in interface order.
+    virtual const ClassInfo& Class() const = 0;
+
+    // The level at which a record writes its group when nothing else is said: directly under a message's root.
+    static constexpr int kLevel = 1;
+
+    void AddRef() const noexcept { references.fetch_add(1, std::memory_order_relaxed); }
+    void Release() const noexcept
+    {
+        if (references.fetch_sub(1, std::memory_order_acq_rel) == 1)
+            delete this;
+    }
+
+protected:
+    Record() = default;
+    virtual ~Record() = default; // protected here and in every class: records live on the heap only
+
+private:
+    mutable std::atomic<std::int32_t> references{0};
+};
+
+// A counted reference to a record; may be null.
+template <class T>
+class Ref
+{
+public:
+    Ref() = default;
+    Ref(std::nullptr_t) {}
+    explicit Ref(T* held) : record(held)
+    {
+        if (record)
+            record->AddRef();
+    }
+    Ref(const Ref& other) : Ref(other.record) {}
+    Ref(Ref&& other) noexcept : record(std::exchange(other.record, nullptr)) {}
+    template <class U>
+    requires std::convertible_to<U*, T*> Ref(const Ref<U>& other) : Ref(static_cast<T*>(other.get())) {}
+    ~Ref()
+    {
+        if (record)
+            record->Release();
+    }
+    Ref& operator=(Ref other) noexcept
+    {
+        std::swap(record, other.record);
+        return *this;
+    }
+
+    T* get() const { return record; }
+    T* operator->() const { return record; }
+    T& operator*() const { return *record; }
+    explicit operator bool() const { return record != nullptr; }
+
+    friend bool operator==(const Ref& a, const Ref& b) { return a.record == b.record; }
+
+private:
+    T* record = nullptr;
+};
+
+// A new record, such as New<VersionDef>().
+template <class T>
+Ref<T> New()
+{
+    return Ref<T>(new T);
+}
+
+// A child of a record: made on first use, and made again when it is used after it was set to nothing.
+template <class T>
+class Child
+{
+public:
+    Child() = default;
+    Child(Ref<T> given) : record(std::move(given)) {}
+
+    T* operator->() const { return Held().get(); }
+    T& operator*() const { return *Held(); }
+
+    const Ref<T>& Held() const
+    {
+        if (!record)
+            record = New<T>();
+        return record;
+    }
+
+private:
+    mutable Ref<T> record;
+};
+
+} // namespace varnex3

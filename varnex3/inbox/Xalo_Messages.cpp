@@ -1,0 +1,86 @@
+#include "varnex3/inbox/Xalo_Messages.h"
+
+#include "varnex3/inbox/InboxFolder.h"
+
+namespace varnex3 {
+
+VARNEX_DEFINE(Xalo_Messages);
+
+bool Xalo_Messages::ParseFiles(const Text& sFolderPath, std::int32_t* ErrorNo, Text* ErrorMessage)
+{
+    const auto fail = [&](std::int32_t number, Text description) {
+        if (ErrorNo)
+            *ErrorNo = number;
+        if (ErrorMessage)
+            *ErrorMessage = std::move(description);
+        return false;
+    };
+    if (!InboxFolder::Exists(sFolderPath))
+        return fail(static_cast<std::int32_t>(ErrorNumber::FolderMissing),
+                    u"Folder '" + sFolderPath + u"' does not exist.");
+    try {
+        AddFiles(sFolderPath);
+        return true;
+    } catch (...) {
+        const Error error = CurrentError("Xalo_Messages.ParseFiles");
+        return fail(error.Number(), error.Description());
+    }
+}
+
+void Xalo_Messages::AddFiles(const Text& folder)
+{
+    InboxFolder inbox(folder);
+    for (const InboxFolder::File& file : inbox.MessageFiles()) {
+        xml::Document document;
+        const bool isWellFormed = inbox.Load(file, document);
+        const Ref<MessageDef> message = Add(file.name); // before its content is looked at: every file gets an entry
+        if (isWellFormed)
+            message->Adopt(std::move(document), file.name, inbox.PathOf(file));
+        else
+            message->ParseXML({}, file.name, inbox.PathOf(file)); // a broken file reads as an empty document
+    }
+}
+
+Variant Xalo_Messages::Remove(const Variant& Index)
+{
+    if (messages.Count() == 0)
+        return Empty;
+    const std::optional<std::int32_t> position = PositionFrom(Index);
+    if (!position)
+        messages.Remove(ToText(Index), "Xalo_Messages.Remove");
+    else if (const std::optional<std::size_t> inRange = PositionInRange(*position))
+        messages.RemoveAt(*inRange);
+    return Empty;
+}
+
+Ref<MessageDef> Xalo_Messages::MessageItems(const Variant& Index)
+{
+    if (messages.Count() == 0)
+        return nullptr;
+    if (const std::optional<std::int32_t> position = PositionFrom(Index)) {
+        const std::optional<std::size_t> inRange = PositionInRange(*position);
+        return inRange ? messages.ItemAt(*inRange) : nullptr;
+    }
+    const Text key = ToText(Index);
+    const Ref<MessageDef>* found = messages.Find(key);
+    if (!found)
+        found = &messages.Add(key, nullptr, "Xalo_Messages.MessageItems"); // looking an unknown key up adds it
+    if (!*found)
+        Raise(ErrorNumber::ObjectRequired, "Xalo_Messages.MessageItems", u"the entry " + Quoted(key) + u" is empty");
+    return *found;
+}
+
+Ref<MessageDef> Xalo_Messages::Add(const Text& Key)
+{
+    return messages.Add(Key, New<MessageDef>(), "Xalo_Messages.Add");
+}
+
+std::int16_t Xalo_Messages::Count() const { return CountOf(messages.Count(), "Xalo_Messages.Count"); }
+
+std::optional<std::size_t> Xalo_Messages::PositionInRange(std::int32_t position) const
+{
+    const bool isInRange = position >= 0 && static_cast<std::size_t>(position) < messages.Count();
+    return isInRange ? std::optional(static_cast<std::size_t>(position)) : std::nullopt;
+}
+
+} // namespace varnex3

@@ -1,0 +1,23 @@
+// Everything public.
+#pragma once
+
+#include "varnex3/Library.h"
+#include "varnex3/core/ClaimHeaderDef.h"
+#include "varnex3/core/CustomerDef.h"
+#include "varnex3/core/DestinationDef.h"
+#include "varnex3/core/InsurerDef.h"
+#include "varnex3/core/InsurerDetailDef.h"
+#include "varnex3/core/InsurerOptDef.h"
+#include "varnex3/core/Json.h"
+#include "varnex3/core/PersonalNameDef.h"
+#include "varnex3/core/RepairerDef.h"
+#include "varnex3/core/RepairerOptDef.h"
+#include "varnex3/core/SourceDef.h"
+#include "varnex3/core/VehicleDef.h"
+#include "varnex3/core/VersionDef.h"
+#include "varnex3/core/XaloBase.h"
+#include "varnex3/core/modFunctions.h"
+#include "varnex3/core/modGeneral.h"
+#include "varnex3/inbox/MessageDef.h"
+#include "varnex3/inbox/Xalo_Messages.h"
+#include "varnex3/xml/Document.h"
