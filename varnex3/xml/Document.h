@@ -25,7 +25,16 @@ namespace varnex3::xml {
 
 class Document;
 
-enum class NodeType : std::uint8_t { None, Document, Element, Text, CData, Comment, Instruction };
+enum class NodeType : std::uint8_t
+{
+    None,
+    Document,
+    Element,
+    Text,
+    CData,
+    Comment,
+    Instruction
+};
 
 // An attribute of an element, namespace declarations not counted. Value: references resolved, white space characters
 // normalised to blanks, as XML requires.

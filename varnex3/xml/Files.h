@@ -1,6 +1,8 @@
 // Whole files in and out, by the path names that hosts use.
 #pragma once
 
+#include <cstddef>
+#include <cstdint>
 #include <string>
 #include <string_view>
 
@@ -12,6 +14,27 @@ std::u16string FromNativePath(std::string_view native);
 
 // The inverse of FromNativePath: what the system's file functions take.
 std::string NativePath(std::u16string_view path);
+
+// A file that is being read. Throws std::system_error with the system's reason.
+class InputFile
+{
+public:
+    explicit InputFile(std::u16string_view path);
+    ~InputFile();
+    InputFile(const InputFile&) = delete;
+    InputFile& operator=(const InputFile&) = delete;
+
+    // What the system says its size is; a file may turn out to be shorter or longer.
+    std::uint64_t Size() const { return size; }
+
+    // Reads up to `count` bytes, fewer only at the end of the file.
+    std::size_t Read(char* to, std::size_t count);
+
+private:
+    std::string name; // for the error
+    int handle = -1;
+    std::uint64_t size = 0;
+};
 
 // The bytes of a file. Throws std::system_error with the system's reason (no such file, no permission, a folder).
 std::string ReadFile(std::u16string_view path);

@@ -7,7 +7,8 @@
 namespace varnex3::xml {
 
 // The kinds of fault the parser tells apart. The numbers are stable: hosts may store them.
-enum class ErrorCode : std::int32_t {
+enum class ErrorCode : std::int32_t
+{
     None = 0,
     UnexpectedEnd = 1,      // the text ends inside an element or inside markup
     NoRootElement = 2,      // an empty text, or one with comments only
@@ -20,19 +21,19 @@ enum class ErrorCode : std::int32_t {
     DuplicateAttribute = 9, // the same attribute twice, prefixes resolved
     InvalidAttribute = 10,  // no equals sign, no quotes, no blank between two attributes
     LessThanInAttribute = 11,
-    InvalidReference = 12,  // a bare "&", a reference without its semicolon
-    UndefinedEntity = 13,   // an entity other than the five predefined ones
-    CDataEndInText = 14,    // "]]>" in text
-    InvalidComment = 15,    // "--" in a comment
+    InvalidReference = 12, // a bare "&", a reference without its semicolon
+    UndefinedEntity = 13,  // an entity other than the five predefined ones
+    CDataEndInText = 14,   // "]]>" in text
+    InvalidComment = 15,   // "--" in a comment
     InvalidInstruction = 16,
     InvalidDeclaration = 17, // the XML declaration
     InvalidMarkup = 18,
     UndeclaredPrefix = 19,
-    ReservedPrefix = 20,     // xml or xmlns bound to, or used for, something else
-    InternalSubset = 21,     // a DOCTYPE with declarations of its own
+    ReservedPrefix = 20, // xml or xmlns bound to, or used for, something else
+    InternalSubset = 21, // a DOCTYPE with declarations of its own
     InvalidDoctype = 22,
     UnknownEncoding = 23,
-    TooLarge = 24,           // more than 4,294,967,295 characters
+    TooLarge = 24, // more than 4,294,967,295 characters
 };
 
 struct ParseError

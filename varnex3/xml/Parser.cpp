@@ -1,0 +1,462 @@
+// The parser: strict, without recursion, and without a stack of its own: an open element is found through its
+// children's parent numbers. Every function takes the place where a piece of markup starts and returns the place after
+// it, or nullptr once a fault is noted.
+#include "varnex3/xml/Parser.h"
+
+#include <algorithm>
+
+#include "varnex3/xml/AttributeCheck.h"
+#include "varnex3/xml/Declaration.h"
+#include "varnex3/xml/Doctype.h"
+#include "varnex3/xml/Lexer.h"
+
+namespace varnex3::xml {
+namespace {
+
+// A guess at how much text makes a node; what is too much is given back.
+constexpr std::size_t charactersPerNode = 24;
+
+template <class Char>
+class Parser
+{
+public:
+    using View = std::basic_string_view<Char>;
+
+    Parser(Tree<Char>& into, View parsedText) : tree(into), lexer(parsedText), check(into, lexer) {}
+
+    bool Run()
+    {
+        tree.nodes.Reserve(static_cast<std::size_t>(lexer.end - lexer.begin) / charactersPerNode + 8);
+        tree.nodes.Append({.parent = 0,
+                           .name = 0,
+                           .text = 0,
+                           .extent = 0,
+                           .firstAttribute = 0,
+                           .nameLength = 0,
+                           .type = NodeType::Document,
+                           .flags = 0});
+        if (!Document(lexer.begin))
+            return false;
+        tree.nodes[documentIndex].extent = static_cast<NodeIndex>(tree.nodes.Size());
+        tree.nodes.Shrink();
+        tree.attributes.Shrink();
+        return true;
+    }
+
+    ParseError Error() const { return Report(FaultInContext(), View(lexer.begin, Length(lexer.begin, lexer.end))); }
+
+private:
+    // ---- the document
+
+    bool Document(const Char* p)
+    {
+        p = XmlDeclaration(p);
+        while (p != nullptr && (p = SkipBlanks(p)) != lexer.end)
+            p = TopLevel(p);
+        if (p != nullptr && !hasRoot)
+            lexer.Fail(ErrorCode::NoRootElement, p, "There is no root element");
+        return p != nullptr && hasRoot;
+    }
+
+    const Char* XmlDeclaration(const Char* p)
+    {
+        const View text(p, Length(p, lexer.end));
+        if (!Declaration<Char>::StartsIn(text))
+            return p;
+        const Declaration<Char> declaration(text);
+        tree.declaration = declaration.Facts();
+        if (!declaration.IsWellFormed())
+            return lexer.Unexpected(ErrorCode::InvalidDeclaration, declaration.After(), declaration.Sentence());
+        return declaration.After();
+    }
+
+    const Char* TopLevel(const Char* p)
+    {
+        if (*p != '<')
+            return lexer.Unexpected(ErrorCode::TextOutsideRoot, p, "The %c stands outside the root element");
+        switch (p[1]) {
+        case '!':
+            return Exclamation(p);
+        case '?':
+            return Instruction(p);
+        case '/':
+            return lexer.Fail(ErrorCode::TagMismatch, p + 2, "An end tag stands where no element is open");
+        default:
+            return RootElement(p);
+        }
+    }
+
+    const Char* RootElement(const Char* p)
+    {
+        if (hasRoot && lexer.NameEnd(p + 1) != p + 1)
+            return lexer.Fail(ErrorCode::SecondRoot, p, "A second element stands after the root element");
+        hasRoot = true;
+        p = StartTag(p);
+        while (p != nullptr && current != documentIndex)
+            p = Content(p);
+        return p;
+    }
+
+    // ---- elements
+
+    // What comes next inside an element.
+    const Char* Content(const Char* p)
+    {
+        p = Text(p);
+        if (p == nullptr)
+            return nullptr;
+        switch (p[1]) {
+        case '/':
+            return EndTag(p);
+        case '!':
+            return Exclamation(p);
+        case '?':
+            return Instruction(p);
+        default:
+            return StartTag(p);
+        }
+    }
+
+    const Char* StartTag(const Char* p)
+    {
+        bool hasPrefix = false;
+        const Char* name = p + 1;
+        p = lexer.Name(name, hasPrefix);
+        if (p == nullptr)
+            return nullptr;
+
+        const NodeIndex element = Append(NodeType::Element);
+        SetName(tree.nodes[element], name, p);
+        if (*p != '>') {
+            p = Attributes(p, element);
+            if (p == nullptr)
+                return nullptr;
+        }
+        if (hasPrefix && !check.ElementName(element))
+            return nullptr;
+        current = element;
+        return *p == '>' ? p + 1 : EmptyTag(p);
+    }
+
+    // "/>", after the attributes.
+    const Char* EmptyTag(const Char* p)
+    {
+        p = lexer.Expect(p + 1, ">", ErrorCode::InvalidMarkup, "The %c stands between '/' and '>'");
+        tree.nodes[current].flags |= IsEmptyTag;
+        Close();
+        return p;
+    }
+
+    const Char* EndTag(const Char* p)
+    {
+        const View name = tree.Name(current);
+        const Char* after = p + 2 + name.size();
+        if (!SameCharacters(p + 2, name.data(), name.size()) || (*after != '>' && !IsBlank(*after)))
+            return Mismatch(p + 2);
+        if (*after != '>') {
+            after = lexer.Expect(SkipBlanks(after), ">", ErrorCode::InvalidMarkup, "The %c stands in an end tag");
+            if (after == nullptr)
+                return nullptr;
+            --after;
+        }
+        Close();
+        return after + 1;
+    }
+
+    [[gnu::cold]] const Char* Mismatch(const Char* name)
+    {
+        bool hasPrefix = false;
+        const Char* after = lexer.Name(name, hasPrefix);
+        if (after == nullptr)
+            return nullptr;
+        if (after == lexer.end)
+            return lexer.Fail(ErrorCode::UnexpectedEnd, after, "");
+        const View found(name, Length(name, after));
+        if (found == tree.Name(current))
+            return lexer.Unexpected(ErrorCode::InvalidMarkup, after, "The %c stands in an end tag");
+        return lexer.Fail(ErrorCode::TagMismatch, name, "The end tag '%1' does not match the start tag '%2'", found,
+                          tree.Name(current));
+    }
+
+    void Close()
+    {
+        TreeNode& element = tree.nodes[current];
+        if (!element.Is(HasTextInside))
+            element.extent = static_cast<NodeIndex>(tree.nodes.Size());
+        check.Leave(current);
+        current = element.parent;
+    }
+
+    // ---- attributes
+
+    // From behind the element's name to the ">" or "/" that ends the list.
+    [[gnu::noinline]] const Char* Attributes(const Char* p, NodeIndex element)
+    {
+        const std::size_t first = tree.attributes.Size();
+        bool hasPrefixes = false;
+        for (;;) {
+            const Char* next = SkipBlanks(p);
+            if (*next == '>' || *next == '/') {
+                p = next;
+                break;
+            }
+            if (next == p)
+                return first == tree.attributes.Size()
+                           ? lexer.Unexpected(ErrorCode::InvalidName, p, "The %c is not allowed in a name")
+                           : lexer.Unexpected(ErrorCode::InvalidAttribute, p, "The %c follows a value without a blank");
+            p = Attribute(next, element, hasPrefixes);
+            if (p == nullptr)
+                return nullptr;
+        }
+        return EndAttributes(element, first, hasPrefixes) ? p : nullptr;
+    }
+
+    const Char* Attribute(const Char* name, NodeIndex element, bool& hasPrefixes)
+    {
+        bool hasPrefix = false;
+        const Char* nameEnd = lexer.Name(name, hasPrefix);
+        if (nameEnd == nullptr)
+            return nullptr;
+        const Char* quote = Quote(nameEnd);
+        if (quote == nullptr)
+            return nullptr;
+        bool needsDecoding = false;
+        const Char* valueEnd = lexer.Value(quote + 1, *quote, needsDecoding);
+        if (valueEnd == nullptr)
+            return nullptr;
+
+        const TreeAttribute& attribute = tree.attributes.Append({.name = Offset(name),
+                                                                 .value = Offset(quote + 1),
+                                                                 .valueLength = ShortLength(quote + 1, valueEnd),
+                                                                 .nameLength = NameLength(name, nameEnd),
+                                                                 .needsDecoding = needsDecoding,
+                                                                 .isLast = false});
+        hasPrefixes |= hasPrefix || IsNamespaceDeclaration(View(name, Length(name, nameEnd)));
+        if (hasPrefix)
+            NoteSpace(attribute, element);
+        return valueEnd + 1;
+    }
+
+    // From behind an attribute's name to the quote that opens its value.
+    const Char* Quote(const Char* p)
+    {
+        p = lexer.Expect(SkipBlanks(p), "=", ErrorCode::InvalidAttribute, "The %c stands where '=' is wanted");
+        if (p == nullptr)
+            return nullptr;
+        p = SkipBlanks(p);
+        if (*p != '"' && *p != '\'')
+            return lexer.Unexpected(ErrorCode::InvalidAttribute, p, "The %c stands where a quote is wanted");
+        return p;
+    }
+
+    bool EndAttributes(NodeIndex element, std::size_t first, bool hasPrefixes)
+    {
+        const std::size_t count = tree.attributes.Size() - first;
+        if (count == 0)
+            return true;
+        tree.nodes[element].flags |= HasAttributes;
+        tree.nodes[element].firstAttribute = static_cast<std::uint32_t>(first);
+        tree.attributes.Back().isLast = true;
+        return (count == 1 && !hasPrefixes) || check.Attributes(element, first, hasPrefixes);
+    }
+
+    // xml:space; other values than the two are as good as none.
+    void NoteSpace(const TreeAttribute& attribute, NodeIndex element)
+    {
+        if (!IsText(tree.AttributeName(attribute), "xml:space"))
+            return;
+        std::u16string value;
+        tree.AppendValue(value, attribute);
+        std::uint8_t& flags = tree.nodes[element].flags;
+        if (value == u"preserve")
+            flags |= PreservesSpace | HasSpaceAttribute;
+        else if (value == u"default")
+            flags = static_cast<std::uint8_t>((flags & ~PreservesSpace) | HasSpaceAttribute);
+    }
+
+    // ---- the rest
+
+    // Up to the next "<".
+    const Char* Text(const Char* p)
+    {
+        if (IsBlank(*p)) {
+            const Char* next = SkipBlanks(p);
+            if (*next == '<' && !tree.nodes[current].Is(PreservesSpace))
+                return next;
+        }
+        bool needsDecoding = false;
+        const Char* after = lexer.Text(p, needsDecoding);
+        if (after != nullptr && after != p)
+            AppendText(p, after, needsDecoding);
+        return after;
+    }
+
+    void AppendText(const Char* p, const Char* after, bool needsDecoding)
+    {
+        const bool isOnlyChild = after[1] == '/' && tree.nodes.Size() == std::size_t{current} + 1;
+        tree.nodes[current].flags |= isOnlyChild ? HasTextInside : IsMixed;
+        SetContent(tree.nodes[isOnlyChild ? current : Append(NodeType::Text)], p, after, needsDecoding);
+    }
+
+    const Char* Exclamation(const Char* p)
+    {
+        switch (p[2]) {
+        case '-':
+            return Comment(p);
+        case '[':
+            return CDataSection(p);
+        case 'D':
+            return DoctypeDeclaration(p);
+        default:
+            return lexer.Unexpected(ErrorCode::InvalidMarkup, p + 2, "The %c follows '<!'");
+        }
+    }
+
+    const Char* Comment(const Char* p)
+    {
+        const Char* content = lexer.Expect(p, "<!--", ErrorCode::InvalidMarkup, "A comment starts with '<!--'");
+        if (content == nullptr)
+            return nullptr;
+        bool needsDecoding = false;
+        const Char* after = lexer.Find(content, "--", needsDecoding);
+        if (after == nullptr)
+            return nullptr;
+        SetContent(tree.nodes[Append(NodeType::Comment)], content, after, needsDecoding);
+        return lexer.Expect(after + 2, ">", ErrorCode::InvalidComment, "The characters '--' stand in a comment");
+    }
+
+    const Char* CDataSection(const Char* p)
+    {
+        if (current == documentIndex)
+            return lexer.Fail(ErrorCode::TextOutsideRoot, p, "A CDATA section stands outside the root element");
+        const Char* content =
+            lexer.Expect(p, "<![CDATA[", ErrorCode::InvalidMarkup, "A section starts with '<![CDATA['");
+        if (content == nullptr)
+            return nullptr;
+        bool needsDecoding = false;
+        const Char* after = lexer.Find(content, "]]>", needsDecoding);
+        if (after == nullptr)
+            return nullptr;
+        tree.nodes[current].flags |= IsMixed;
+        SetContent(tree.nodes[Append(NodeType::CData)], content, after, needsDecoding);
+        return after + 3;
+    }
+
+    const Char* Instruction(const Char* p)
+    {
+        const Char* target = p + 2;
+        const Char* targetEnd = InstructionTarget(target);
+        if (targetEnd == nullptr)
+            return nullptr;
+        const Char* content = SkipBlanks(targetEnd);
+        if (content == targetEnd && !lexer.StartsWith(content, "?>"))
+            return lexer.Unexpected(ErrorCode::InvalidInstruction, content,
+                                    "The %c follows the name of a processing instruction");
+        bool needsDecoding = false;
+        const Char* after = lexer.Find(content, "?>", needsDecoding);
+        if (after == nullptr)
+            return nullptr;
+        TreeNode& node = tree.nodes[Append(NodeType::Instruction)];
+        SetName(node, target, targetEnd);
+        SetContent(node, content, after, needsDecoding);
+        return after + 2;
+    }
+
+    const Char* InstructionTarget(const Char* p)
+    {
+        const Char* after = lexer.NameEnd(p);
+        const View target(p, Length(p, after));
+        if (target.empty())
+            return lexer.Unexpected(ErrorCode::InvalidInstruction, p, "A processing instruction cannot start with %c");
+        if (target.find(Char{':'}) != View::npos)
+            return lexer.Fail(ErrorCode::InvalidInstruction, p, "The processing instruction '%1' has a colon", target);
+        if (IsText(target, "xml"))
+            return lexer.Fail(ErrorCode::InvalidInstruction, p, "An XML declaration stands only at the very start");
+        if (target.size() == 3 && (Unit(p[0]) | 0x20) == 'x' && (Unit(p[1]) | 0x20) == 'm'
+            && (Unit(p[2]) | 0x20) == 'l')
+            return lexer.Fail(ErrorCode::InvalidInstruction, p, "The name '%1' is reserved", target);
+        return after;
+    }
+
+    const Char* DoctypeDeclaration(const Char* p)
+    {
+        if (hasRoot || hasDoctype)
+            return lexer.Fail(ErrorCode::InvalidDoctype, p, "A DOCTYPE stands once, before the root element");
+        hasDoctype = true;
+        return Doctype<Char>(lexer).Read(p);
+    }
+
+    // ---- nodes
+
+    NodeIndex Append(NodeType type)
+    {
+        const auto index = static_cast<NodeIndex>(tree.nodes.Size());
+        const auto inherited = static_cast<std::uint8_t>(tree.nodes[current].flags & PreservesSpace);
+        tree.nodes.Append({.parent = current,
+                           .name = 0,
+                           .text = 0,
+                           .extent = 0,
+                           .firstAttribute = 0,
+                           .nameLength = 0,
+                           .type = type,
+                           .flags = inherited});
+        return index;
+    }
+
+    void SetName(TreeNode& node, const Char* name, const Char* after) const
+    {
+        node.name = Offset(name);
+        node.nameLength = NameLength(name, after);
+    }
+
+    void SetContent(TreeNode& node, const Char* content, const Char* after, bool needsDecoding) const
+    {
+        node.text = Offset(content);
+        node.extent = ShortLength(content, after);
+        node.flags |= needsDecoding ? NeedsDecoding : 0;
+    }
+
+    std::uint32_t Offset(const Char* p) const { return ShortLength(tree.text.Data(), p); }
+    static std::size_t Length(const Char* p, const Char* after) { return static_cast<std::size_t>(after - p); }
+    static std::uint32_t ShortLength(const Char* p, const Char* after) { return static_cast<std::uint32_t>(after - p); }
+    static std::uint16_t NameLength(const Char* p, const Char* after)
+    {
+        return static_cast<std::uint16_t>(std::min<std::size_t>(Length(p, after), Tree<Char>::longName));
+    }
+    static bool IsText(View text, std::string_view ascii)
+    {
+        return text.size() == ascii.size() && Lexer<Char>::StartsWith(text.data(), ascii.data());
+    }
+
+    Fault<Char> FaultInContext() const
+    {
+        Fault<Char> fault = lexer.fault;
+        if (fault.code == ErrorCode::UnexpectedEnd && current != documentIndex) {
+            fault.sentence = "The text ends inside the element '%1'";
+            fault.first = tree.Name(current);
+        }
+        return fault;
+    }
+
+    Tree<Char>& tree;
+    Lexer<Char> lexer;
+    AttributeCheck<Char> check;
+    NodeIndex current = documentIndex; // the innermost open element
+    bool hasRoot = false;
+    bool hasDoctype = false;
+};
+
+} // namespace
+
+template <class Char>
+ParseError Parse(TextBuffer<Char> text, std::size_t offset, Tree<Char>& into)
+{
+    into = Tree<Char>(std::move(text));
+    Parser<Char> parser(into, into.text.View().substr(offset));
+    return parser.Run() ? ParseError{} : parser.Error();
+}
+
+template ParseError Parse(TextBuffer<char>, std::size_t, Tree<char>&);
+template ParseError Parse(TextBuffer<char16_t>, std::size_t, Tree<char16_t>&);
+
+} // namespace varnex3::xml

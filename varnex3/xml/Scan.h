@@ -1,0 +1,202 @@
+// The loops that look at every character: how far a run of plain ones goes. Sixteen at a time where the processor has
+// SSE2, one at a time elsewhere. The text must be followed by `padding` zeros: they end every run.
+#pragma once
+
+#include <array>
+#include <bit>
+#include <cstddef>
+#include <cstdint>
+#include <cstring>
+
+#include "varnex3/xml/Characters.h"
+
+#if defined(__SSE2__) && !defined(VARNEX3_XML_SCALAR)
+#define VARNEX3_XML_SSE2
+#include <emmintrin.h>
+#endif
+
+namespace varnex3::xml {
+
+// Zeros after a text: a block that starts at its end, and what the parser looks ahead.
+inline constexpr std::size_t padding = 32;
+
+namespace detail {
+
+#ifdef VARNEX3_XML_SSE2
+
+inline constexpr int blockSize = 16;
+
+inline __m128i LoadBlock(const void* p) { return _mm_loadu_si128(static_cast<const __m128i*>(p)); }
+inline __m128i LoadCharacters(const char* p) { return LoadBlock(p); }
+
+// Sixteen characters as bytes. Those beyond U+00FF become 0xFF or 0, which are in no class of plain characters.
+inline __m128i LoadCharacters(const char16_t* p) { return _mm_packus_epi16(LoadBlock(p), LoadBlock(p + 8)); }
+
+inline __m128i Equal(__m128i block, char c) { return _mm_cmpeq_epi8(block, _mm_set1_epi8(c)); }
+
+inline __m128i AtMost(__m128i block, char limit)
+{
+    return _mm_cmpeq_epi8(_mm_min_epu8(block, _mm_set1_epi8(limit)), block);
+}
+
+inline __m128i Between(__m128i block, char first, char last)
+{
+    return AtMost(_mm_sub_epi8(block, _mm_set1_epi8(first)), static_cast<char>(last - first));
+}
+
+template <class... Blocks>
+__m128i AnyOf(__m128i first, Blocks... others)
+{
+    ((first = _mm_or_si128(first, others)), ...);
+    return first;
+}
+
+// Sixteen characters to another width, when all are ASCII.
+inline bool CopyAsciiBlock(const char* from, char16_t* to)
+{
+    const __m128i block = LoadBlock(from);
+    if (_mm_movemask_epi8(block) != 0)
+        return false;
+    _mm_storeu_si128(reinterpret_cast<__m128i*>(to), _mm_unpacklo_epi8(block, _mm_setzero_si128()));
+    _mm_storeu_si128(reinterpret_cast<__m128i*>(to + 8), _mm_unpackhi_epi8(block, _mm_setzero_si128()));
+    return true;
+}
+
+inline bool CopyAsciiBlock(const char16_t* from, char* to)
+{
+    const __m128i first = LoadBlock(from);
+    const __m128i second = LoadBlock(from + 8);
+    const __m128i beyondAscii = _mm_and_si128(_mm_or_si128(first, second), _mm_set1_epi16(static_cast<short>(0xFF80)));
+    if (_mm_movemask_epi8(_mm_cmpeq_epi16(beyondAscii, _mm_setzero_si128())) != 0xFFFF)
+        return false;
+    _mm_storeu_si128(reinterpret_cast<__m128i*>(to), _mm_packus_epi16(first, second));
+    return true;
+}
+
+// One bit for each of the sixteen characters that is in the class, or is not.
+inline std::uint32_t Bits(__m128i isInClass) { return static_cast<std::uint32_t>(_mm_movemask_epi8(isInClass)); }
+inline std::uint32_t OtherBits(__m128i isInClass) { return Bits(isInClass) ^ 0xFFFFu; }
+
+// Where the first block with a stop has it.
+template <class Char, class Stops>
+const Char* FindStop(const Char* p, Stops stops)
+{
+    for (;; p += blockSize)
+        if (const std::uint32_t bits = stops(LoadCharacters(p)); bits != 0)
+            return p + std::countr_zero(bits);
+}
+
+#else
+
+enum CharacterClass : std::uint8_t
+{
+    PlainInText = 1,
+    PlainInValue = 2,
+    InName = 4,
+    Blank = 8
+};
+
+constexpr std::uint8_t ClassesOf(char c)
+{
+    const bool isPrintable = c >= 0x20;
+    const bool isMarkup = c == '<' || c == '&';
+    const bool isQuote = c == '"' || c == '\'';
+    const bool isInName = IsAsciiLetter(c) || IsDigit(c) || c == '-' || c == '.' || c == '_';
+    return static_cast<std::uint8_t>((isPrintable && !isMarkup && c != ']' ? PlainInText : 0)
+                                     | (isPrintable && !isMarkup && !isQuote ? PlainInValue : 0)
+                                     | (isInName ? InName : 0) | (IsBlank(c) ? Blank : 0));
+}
+
+inline constexpr auto classTable = [] {
+    std::array<std::uint8_t, 256> table{};
+    for (std::size_t c = 0; c < 128; ++c)
+        table[c] = ClassesOf(static_cast<char>(c));
+    return table;
+}();
+
+template <class Char>
+const Char* SkipClass(const Char* p, CharacterClass wanted)
+{
+    while (Unit(*p) < classTable.size() && (classTable[Unit(*p)] & wanted) != 0)
+        ++p;
+    return p;
+}
+
+#endif
+
+} // namespace detail
+
+// The first character that is "<", "&", "]", below U+0020 or beyond ASCII.
+template <class Char>
+const Char* SkipPlainText(const Char* p)
+{
+#ifdef VARNEX3_XML_SSE2
+    using namespace detail;
+    return FindStop(p, [](__m128i b) {
+        return Bits(AnyOf(b, Equal(b, '<'), Equal(b, '&'), Equal(b, ']'), AtMost(b, 0x1F))); // b itself: beyond ASCII
+    });
+#else
+    return detail::SkipClass(p, detail::PlainInText);
+#endif
+}
+
+// The first character that is "<", "&", the quote, below U+0020 or beyond ASCII; perhaps the other quote.
+template <class Char>
+const Char* SkipPlainValue(const Char* p, [[maybe_unused]] Char quote)
+{
+#ifdef VARNEX3_XML_SSE2
+    using namespace detail;
+    return FindStop(p, [quote](__m128i b) {
+        return Bits(AnyOf(b, Equal(b, '<'), Equal(b, '&'), Equal(b, static_cast<char>(quote)), AtMost(b, 0x1F)));
+    });
+#else
+    return detail::SkipClass(p, detail::PlainInValue);
+#endif
+}
+
+// The first character that is no ASCII letter, digit, "-", "." or "_".
+template <class Char>
+const Char* SkipNameCharacters(const Char* p)
+{
+#ifdef VARNEX3_XML_SSE2
+    using namespace detail;
+    return FindStop(p, [](__m128i b) {
+        const __m128i lower = _mm_or_si128(b, _mm_set1_epi8(0x20));
+        return OtherBits(AnyOf(Between(lower, 'a', 'z'), Between(b, '0', '9'), Between(b, '-', '.'), Equal(b, '_')));
+    });
+#else
+    return detail::SkipClass(p, detail::InName);
+#endif
+}
+
+// The first character that is not white space.
+template <class Char>
+const Char* SkipBlanks(const Char* p)
+{
+#ifdef VARNEX3_XML_SSE2
+    using namespace detail;
+    return FindStop(
+        p, [](__m128i b) { return OtherBits(AnyOf(Equal(b, ' '), Equal(b, '\t'), Equal(b, '\r'), Equal(b, '\n'))); });
+#else
+    return detail::SkipClass(p, detail::Blank);
+#endif
+}
+
+// Whether two padded texts begin with the same `count` characters.
+template <class Char>
+bool SameCharacters(const Char* left, const Char* right, std::size_t count)
+{
+#ifdef VARNEX3_XML_SSE2
+    using namespace detail;
+    constexpr std::size_t perBlock = blockSize / sizeof(Char);
+    for (; count > perBlock; left += perBlock, right += perBlock, count -= perBlock)
+        if (Bits(_mm_cmpeq_epi8(LoadBlock(left), LoadBlock(right))) != 0xFFFFu)
+            return false;
+    const std::uint32_t wanted = (1u << (count * sizeof(Char))) - 1;
+    return (OtherBits(_mm_cmpeq_epi8(LoadBlock(left), LoadBlock(right))) & wanted) == 0;
+#else
+    return std::memcmp(left, right, count * sizeof(Char)) == 0;
+#endif
+}
+
+} // namespace varnex3::xml
