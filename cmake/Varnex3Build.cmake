@@ -14,6 +14,7 @@ target_compile_options(varnex3_build INTERFACE
     -Wall -Wextra -Wpedantic -Wconversion -Wsign-conversion -Wnon-virtual-dtor -Wold-style-cast
     -Wcast-align -Woverloaded-virtual
     $<$<CXX_COMPILER_ID:GNU>:-Wshadow=local>
+    $<$<CXX_COMPILER_ID:GNU>:-Wno-restrict> # false alarms of g++ 12 on u"literal" + text
     $<$<CXX_COMPILER_ID:Clang>:-Wshadow>)
 if(VARNEX3_WERROR)
     target_compile_options(varnex3_build INTERFACE -Werror)
