@@ -20,6 +20,7 @@ class Parameter:
     type_name: str
     is_optional: bool
     initial: str
+    is_by_reference: bool
     is_output: bool
 
 
@@ -54,6 +55,7 @@ def _parameter(owner: bytes, member: int, position: int) -> Parameter:
         decode(info.type_name),
         bool(info.is_optional),
         decode(info.initial),
+        bool(info.is_by_reference),
         bool(info.is_output),
     )
 

@@ -1,0 +1,58 @@
+# One word for each thing a person does; `make help` lists them.
+JOBS ?= $(shell nproc)
+BUILD := build/release
+CMAKE_BUILD = cmake --build --preset $(1) --parallel $(JOBS)
+
+.DEFAULT_GOAL := build
+.PHONY: help setup build demo test sanitize bench format layout tidy docs install clean
+
+help: ## this list
+	@sed -n 's/^\([a-z]*\):.*## /\1\t/p' $(MAKEFILE_LIST) | expand -t 12
+
+setup: ## install what is missing (Debian packages), saying what it does
+	@scripts/setup
+
+build: $(BUILD)/CMakeCache.txt ## build the library, the tool and the tests into build/release
+	@$(call CMAKE_BUILD,release)
+
+$(BUILD)/CMakeCache.txt: CMakePresets.json
+	@scripts/setup
+	@cmake --preset release
+
+demo: setup build ## build what is missing and summarise the sample inbox
+	@$(BUILD)/tools/varnex3 scan samples/inbox; status=$$?; test $$status -le 1
+
+test: setup build ## build and run every test
+	@scripts/run_tests $(BUILD)
+
+sanitize: setup ## build with the address and undefined-behaviour sanitizers and run every test
+	@cmake --preset asan
+	@$(call CMAKE_BUILD,asan)
+	@scripts/run_tests build/asan
+
+bench: setup ## measure against the peers, print the ratios
+	@scripts/setup bench
+	@cmake --preset bench
+	@$(call CMAKE_BUILD,bench)
+	@benchmarks/run build/bench
+
+format: ## lay out every C++ file
+	@scripts/setup tidy
+	@scripts/sources | xargs clang-format -i
+
+layout: ## check that every C++ file is laid out as `make format` would
+	@scripts/setup tidy
+	@scripts/sources | xargs clang-format --dry-run -Werror
+
+tidy: setup layout ## the same, and every source file through clang-tidy
+	@cmake --preset tidy
+	@$(call CMAKE_BUILD,tidy)
+
+docs: build ## write the reference, a page for each class, into build/docs/reference
+	@PYTHONPATH=bindings/python python3 -B scripts/make_reference build/docs/reference
+
+install: build ## install under PREFIX (default: /usr/local)
+	@cmake --install $(BUILD) $(if $(PREFIX),--prefix $(PREFIX))
+
+clean: ## remove what was built
+	@rm -rf build bindings/python/varnex3/*.so bindings/python/varnex3/*.pyi
