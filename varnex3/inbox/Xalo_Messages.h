@@ -22,7 +22,7 @@ class Xalo_Messages final : public Record
         Variant, Remove, (const Variant& Index),
         "Removes an entry; a position out of range does nothing, an unknown key raises KeyNotFound (32811). The "
         "result is always Empty.");
-    VARNEX_METHOD(
+    VARNEX_INDEXED_READONLY(
         Ref<MessageDef>, MessageItems, (const Variant& Index),
         "An entry; nothing when the list is empty or the position is out of range. An unknown key adds an empty "
         "entry under that key and raises ObjectRequired (424).");

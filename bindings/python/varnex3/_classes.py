@@ -165,7 +165,7 @@ def _default(parameter: Parameter) -> Any:
     return parameter.initial if parameter.kind == TEXT else 0
 
 
-Invoke = Callable[[Passing, Value], int]
+Invoke = Callable[[Passing, Value], Any]
 
 
 def _called(member: Member, bound: inspect.BoundArguments, first: tuple[str, ...], invoke: Invoke) -> Any:
@@ -251,8 +251,9 @@ def _made(info: Class) -> type[Record]:
 
 
 def _module(info: Class) -> type:
-    functions = {member.name: staticmethod(_function(info, member)) for member in info.members}
-    return type(info.name, (), {"__doc__": info.doc, "__module__": "varnex3", **functions})
+    body: dict[str, Any] = {"__doc__": info.doc, "__module__": "varnex3"}
+    body |= {member.name: staticmethod(_function(info, member)) for member in info.members}
+    return type(info.name, (), body)
 
 
 RECORDS: dict[str, type[Record]] = {name: _made(info) for name, info in CLASSES.items() if not info.is_module}
