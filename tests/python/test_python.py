@@ -191,6 +191,29 @@ class Documentation(unittest.TestCase):
             for member in info.members:
                 self.assertIn(f"def {member.name}(", stubs)
 
+    @unittest.skipIf("LD_PRELOAD" in os.environ, "a sanitizer build makes no stubs")
+    def test_a_type_checker_knows_the_types_of_properties_and_results(self) -> None:
+        program = """
+import varnex3
+messages = varnex3.Xalo_Messages()
+ok, number, words = messages.ParseFiles("inbox")
+reveal_type((ok, number, words, messages.MessageItems(0), varnex3.CustomerDef().PersonalName.Surname))
+varnex3.VehicleDef().VIN = 12
+"""
+        with tempfile.TemporaryDirectory() as folder:
+            file = pathlib.Path(folder, "host.py")
+            file.write_text(program)
+            checked = subprocess.run(
+                ["/usr/bin/mypy", "--strict", "--no-incremental", file],
+                env=os.environ | {"MYPYPATH": str(pathlib.Path(varnex3.__file__).parent.parent)},
+                capture_output=True,
+                text=True,
+                check=False,
+            ).stdout
+        self.assertIn("Tuple[builtins.bool, builtins.int, builtins.str, Union[varnex3.MessageDef, None], builtins.str]", checked)
+        self.assertIn('expression has type "int", variable has type "str"', checked)
+        self.assertIn("Found 1 error", checked)
+
     def test_the_package_loads_in_a_fresh_interpreter(self) -> None:
         done = subprocess.run(
             [sys.executable, "-c", "import varnex3; print(varnex3.__version__)"], capture_output=True, text=True, check=True
