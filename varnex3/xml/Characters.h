@@ -1,9 +1,9 @@
 // The character classes of XML 1.0 (fifth edition), and code points in UTF-8 and UTF-16.
 #pragma once
 
+#include <cstddef>
 #include <cstdint>
 #include <string>
-#include <type_traits>
 
 namespace varnex3::xml {
 
@@ -128,31 +128,43 @@ constexpr CodePoint DecodePoint(const char* p, const char* end, bool areSurrogat
     return {value, lead.length};
 }
 
-inline void AppendPoint(std::u16string& to, char32_t c)
+// Writes a code point, and returns the place after it.
+constexpr char16_t* PutPoint(char16_t* to, char32_t c)
 {
     if (c >= 0x10000) {
-        to += static_cast<char16_t>(0xD800 + ((c - 0x10000) >> 10));
+        *to++ = static_cast<char16_t>(0xD800 + ((c - 0x10000) >> 10));
         c = 0xDC00 + ((c - 0x10000) & 0x3FF);
     }
-    to += static_cast<char16_t>(c);
+    *to++ = static_cast<char16_t>(c);
+    return to;
 }
 
-inline void AppendPoint(std::string& to, char32_t c)
+constexpr char* PutPoint(char* to, char32_t c)
 {
-    const auto add = [&to](char32_t unit) { to += static_cast<char>(static_cast<unsigned char>(unit)); };
-    if (c < 0x80)
-        return add(c);
-    if (c < 0x800)
-        add(0xC0 | c >> 6);
-    else if (c < 0x10000)
-        add(0xE0 | c >> 12);
-    else {
-        add(0xF0 | c >> 18);
-        add(0x80 | (c >> 12 & 0x3F));
+    const auto put = [&to](char32_t unit) { *to++ = static_cast<char>(static_cast<unsigned char>(unit)); };
+    if (c < 0x80) {
+        put(c);
+        return to;
     }
-    if (c >= 0x800)
-        add(0x80 | (c >> 6 & 0x3F));
-    add(0x80 | (c & 0x3F));
+    if (c < 0x800) {
+        put(0xC0 | c >> 6);
+    } else if (c < 0x10000) {
+        put(0xE0 | c >> 12);
+        put(0x80 | (c >> 6 & 0x3F));
+    } else {
+        put(0xF0 | c >> 18);
+        put(0x80 | (c >> 12 & 0x3F));
+        put(0x80 | (c >> 6 & 0x3F));
+    }
+    put(0x80 | (c & 0x3F));
+    return to;
+}
+
+template <class Char>
+void AppendPoint(std::basic_string<Char>& to, char32_t c)
+{
+    Char units[4];
+    to.append(units, PutPoint(units, c));
 }
 
 } // namespace varnex3::xml

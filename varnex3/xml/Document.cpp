@@ -27,13 +27,31 @@ const ParseError& ErrorOfNothing()
     return error;
 }
 
-// A text that starts with neither markup nor white space fails there: the rest of it need not be copied.
+// How much of a text decides whether it is well-formed. One that starts with neither markup nor white space fails
+// there: the rest of it need not be copied.
 template <class Char>
-std::basic_string_view<Char> WhatDecides(std::basic_string_view<Char> text)
+std::size_t DecisiveLength(std::basic_string_view<Char> text)
 {
     constexpr std::size_t longestCharacter = 4;
     const bool mayBeWellFormed = text.empty() || text[0] == '<' || IsBlank(text[0]);
-    return mayBeWellFormed ? text : text.substr(0, longestCharacter);
+    return mayBeWellFormed ? text.size() : std::min(text.size(), longestCharacter);
+}
+
+// A whole file, read into the buffer it is parsed in. One that grows meanwhile is followed to its end.
+TextBuffer<char> ReadAll(InputFile& file)
+{
+    TextBuffer<char> bytes(file.Room());
+    std::size_t length = 0;
+    for (;;) {
+        length += file.Read(bytes.Data() + length, bytes.Size() - length);
+        if (length < bytes.Size())
+            break;
+        TextBuffer<char> larger(bytes.Size() * 2);
+        std::copy_n(bytes.Data(), length, larger.Data());
+        bytes = std::move(larger);
+    }
+    bytes.Shorten(length);
+    return bytes;
 }
 
 } // namespace
@@ -43,6 +61,17 @@ struct Document::Content
     std::variant<Tree<char>, Tree<char16_t>> tree;
     ParseError error;
 
+    // Replaces a document's content by what the action loads; by nothing, when it throws.
+    template <class Action>
+    static bool Replace(std::unique_ptr<Content>& content, Action load)
+    {
+        content.reset();
+        auto loaded = std::make_unique<Content>();
+        load(*loaded);
+        content = std::move(loaded);
+        return !content->error;
+    }
+
     template <class Char>
     void Load(TextBuffer<Char> text, std::size_t offset)
     {
@@ -50,6 +79,20 @@ struct Document::Content
         error = Parse(std::move(text), offset, parsed);
         if (!error)
             tree = std::move(parsed);
+    }
+
+    // Bytes in any encoding. The action gives the first of them, as many as are asked for, as a buffer to parse in.
+    template <class TakeFirst>
+    void LoadBytes(std::string_view bytes, TakeFirst takeFirst)
+    {
+        const EncodingFacts facts = DetectEncoding(bytes);
+        const std::string_view text = bytes.substr(facts.markLength);
+        if (text.size() > longestText)
+            error = TooLarge();
+        else if (facts.encoding == Encoding::Utf8)
+            Load(takeFirst(facts.markLength + DecisiveLength(text)), facts.markLength);
+        else
+            LoadDecoded(text, facts);
     }
 
     void LoadDecoded(std::string_view bytes, const EncodingFacts& facts);
@@ -110,38 +153,37 @@ Document& Document::operator=(Document&& other) noexcept = default;
 
 bool Document::LoadText(std::u16string_view text)
 {
-    content.reset();
-    auto loaded = std::make_unique<Content>();
     if (text.substr(0, 1) == u"\uFEFF")
         text.remove_prefix(1);
-    if (text.size() > longestText)
-        loaded->error = TooLarge();
-    else
-        loaded->Load(TextBuffer<char16_t>(WhatDecides(text)), 0);
-    content = std::move(loaded);
-    return !content->error;
+    return Content::Replace(content, [&](Content& loaded) {
+        if (text.size() > longestText)
+            loaded.error = TooLarge();
+        else
+            loaded.Load(TextBuffer<char16_t>(text.substr(0, DecisiveLength(text))), 0);
+    });
 }
 
 bool Document::LoadBytes(std::string_view bytes)
 {
-    content.reset();
-    auto loaded = std::make_unique<Content>();
-    const EncodingFacts facts = DetectEncoding(bytes);
-    bytes.remove_prefix(facts.markLength);
-    if (bytes.size() > longestText)
-        loaded->error = TooLarge();
-    else if (facts.encoding == Encoding::Utf8)
-        loaded->Load(TextBuffer<char>(WhatDecides(bytes)), 0);
-    else
-        loaded->LoadDecoded(bytes, facts);
-    content = std::move(loaded);
-    return !content->error;
+    return Content::Replace(content, [&](Content& loaded) {
+        loaded.LoadBytes(bytes, [&](std::size_t length) { return TextBuffer<char>(bytes.substr(0, length)); });
+    });
 }
 
 bool Document::LoadFile(std::u16string_view path)
 {
-    content.reset();
-    return LoadBytes(ReadFile(path));
+    return Content::Replace(content, [&](Content& loaded) {
+        InputFile file(path);
+        if (file.Size() > longestText) {
+            loaded.error = TooLarge();
+            return;
+        }
+        TextBuffer<char> bytes = ReadAll(file);
+        loaded.LoadBytes(bytes.View(), [&](std::size_t length) {
+            bytes.Shorten(length);
+            return std::move(bytes);
+        });
+    });
 }
 
 const ParseError& Document::Error() const { return content ? content->error : ErrorOfNothing(); }

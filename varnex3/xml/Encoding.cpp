@@ -60,8 +60,9 @@ std::string LowerCase(std::string_view text)
 
 EncodingFacts EncodingNamed(std::string_view name)
 {
+    const std::string wanted = LowerCase(name);
     for (const EncodingName& known : encodingNames)
-        if (known.name == LowerCase(name))
+        if (known.name == wanted)
             return {known.encoding, 0, {}, nullptr};
     return {Encoding::Unknown, 0, std::string(name), name.data()};
 }
@@ -98,12 +99,8 @@ TextBuffer<char> Utf8FromSingleBytes(std::string_view bytes, Encoding encoding)
 
     TextBuffer<char> text(length);
     char* to = text.Data();
-    std::string point;
-    for (const char byte : bytes) {
-        point.clear();
-        AppendPoint(point, CharacterOf(byte, encoding));
-        to = std::copy(point.begin(), point.end(), to);
-    }
+    for (const char byte : bytes)
+        to = PutPoint(to, CharacterOf(byte, encoding));
     return text;
 }
 

@@ -5,7 +5,9 @@
 #include <cerrno>
 #include <cstdio>
 #include <cstdlib>
+#include <limits>
 #include <memory>
+#include <new>
 #include <system_error>
 
 #include <fcntl.h>
@@ -26,6 +28,13 @@ constexpr char16_t lastEscape = 0xDCFF;
     throw std::system_error(code, std::generic_category(), name);
 }
 
+// To be called on the outcome of a system call, before another one changes errno.
+void Check(bool isDone, const std::string& name)
+{
+    if (!isDone)
+        ThrowSystemError(errno, name);
+}
+
 // A name with a zero character would name another file than the one meant.
 std::string CheckedName(std::u16string_view path)
 {
@@ -38,34 +47,30 @@ std::string CheckedName(std::u16string_view path)
 class FileHandle
 {
 public:
-    explicit FileHandle(int handle) : number(handle) {}
-    ~FileHandle() { Close(); }
+    FileHandle(const std::string& fileName, int flags, mode_t mode = 0)
+        : name(fileName), number(open(name.c_str(), flags | O_CLOEXEC, mode))
+    {
+        Check(number >= 0, name);
+    }
+    ~FileHandle() { close(number); }
     FileHandle(const FileHandle&) = delete;
     FileHandle& operator=(const FileHandle&) = delete;
 
-    bool IsOpen() const { return number >= 0; }
     int Number() const { return number; }
-    bool Close()
+
+    void Write(std::string_view bytes)
     {
-        const int closed = number;
-        number = -1;
-        return closed < 0 || close(closed) == 0;
+        while (!bytes.empty()) {
+            const ssize_t written = write(number, bytes.data(), bytes.size());
+            Check(written >= 0 || errno == EINTR, name);
+            bytes.remove_prefix(written > 0 ? static_cast<std::size_t>(written) : 0);
+        }
     }
 
 private:
+    std::string name;
     int number;
 };
-
-bool WriteAll(int handle, std::string_view bytes)
-{
-    while (!bytes.empty()) {
-        const ssize_t written = write(handle, bytes.data(), bytes.size());
-        if (written < 0 && errno != EINTR)
-            return false;
-        bytes.remove_prefix(written > 0 ? static_cast<std::size_t>(written) : 0);
-    }
-    return true;
-}
 
 // The file that a name leads to through symbolic links, so that a link stays one.
 std::string TargetOf(const std::string& name)
@@ -90,53 +95,56 @@ std::string NewTemporaryName(const std::string& folder)
 class TemporaryFile
 {
 public:
-    explicit TemporaryFile(const std::string& folder) : name(NewTemporaryName(folder)), file(Create(name)) {}
+    explicit TemporaryFile(const std::string& folder)
+        : name(NewTemporaryName(folder)), file(name, O_WRONLY | O_CREAT | O_EXCL, 0666)
+    {}
     ~TemporaryFile()
     {
-        if (!isMoved && file.IsOpen())
+        if (!isMoved)
             unlink(name.c_str());
     }
+    TemporaryFile(const TemporaryFile&) = delete;
+    TemporaryFile& operator=(const TemporaryFile&) = delete;
 
-    // False, with errno, when something fails.
-    bool IsCreated() const { return file.IsOpen(); }
-    bool TakeModeFrom(const struct stat& other) { return fchmod(file.Number(), other.st_mode & 07777) == 0; }
-    bool Write(std::string_view bytes) { return WriteAll(file.Number(), bytes) && fsync(file.Number()) == 0; }
-    bool MoveTo(const std::string& target) { return isMoved = rename(name.c_str(), target.c_str()) == 0; }
+    void TakeMode(mode_t mode) { Check(fchmod(file.Number(), mode & 07777) == 0, name); }
 
-private:
-    static int Create(const std::string& name)
+    void Write(std::string_view bytes)
     {
-        return open(name.c_str(), O_WRONLY | O_CREAT | O_EXCL | O_CLOEXEC, 0666);
+        file.Write(bytes);
+        Check(fsync(file.Number()) == 0, name);
     }
 
+    void MoveTo(const std::string& target)
+    {
+        isMoved = rename(name.c_str(), target.c_str()) == 0;
+        Check(isMoved, target);
+    }
+
+private:
     std::string name;
     FileHandle file;
     bool isMoved = false;
 };
 
-bool WriteDirectly(const std::string& name, std::string_view bytes)
-{
-    FileHandle file(open(name.c_str(), O_WRONLY | O_CLOEXEC));
-    return file.IsOpen() && WriteAll(file.Number(), bytes) && file.Close();
-}
-
-// So that the renaming outlives a crash too. Not every file system can; the file itself is safe already.
+// So that the renaming outlives a crash too. Not every file system can; either file is whole in any case.
 void SyncFolder(const std::string& folder)
 {
-    const FileHandle handle(open(folder.c_str(), O_RDONLY | O_DIRECTORY | O_CLOEXEC));
-    if (handle.IsOpen())
-        fsync(handle.Number());
+    const int handle = open(folder.c_str(), O_RDONLY | O_DIRECTORY | O_CLOEXEC);
+    if (handle < 0)
+        return;
+    fsync(handle);
+    close(handle);
 }
 
-bool Replace(const std::string& target, std::string_view bytes, const struct stat* old)
+void Replace(const std::string& target, std::string_view bytes, const struct stat* old)
 {
     const std::string folder = FolderOf(target);
     TemporaryFile temporary(folder);
-    const bool isDone = temporary.IsCreated() && (old == nullptr || temporary.TakeModeFrom(*old))
-                        && temporary.Write(bytes) && temporary.MoveTo(target);
-    if (isDone)
-        SyncFolder(folder);
-    return isDone;
+    if (old != nullptr)
+        temporary.TakeMode(old->st_mode);
+    temporary.Write(bytes);
+    temporary.MoveTo(target);
+    SyncFolder(folder);
 }
 
 } // namespace
@@ -174,8 +182,7 @@ std::string NativePath(std::u16string_view path)
 InputFile::InputFile(std::u16string_view path)
     : name(CheckedName(path)), handle(open(name.c_str(), O_RDONLY | O_CLOEXEC))
 {
-    if (handle < 0)
-        ThrowSystemError(errno, name);
+    Check(handle >= 0, name);
     struct stat facts = {};
     if (fstat(handle, &facts) == 0 && S_ISREG(facts.st_mode))
         size = static_cast<std::uint64_t>(facts.st_size);
@@ -188,8 +195,7 @@ std::size_t InputFile::Read(char* to, std::size_t count)
     std::size_t done = 0;
     while (done < count) {
         const ssize_t got = read(handle, to + done, count - done);
-        if (got < 0 && errno != EINTR)
-            ThrowSystemError(errno, name);
+        Check(got >= 0 || errno == EINTR, name);
         if (got == 0)
             break;
         done += got > 0 ? static_cast<std::size_t>(got) : 0;
@@ -197,17 +203,21 @@ std::size_t InputFile::Read(char* to, std::size_t count)
     return done;
 }
 
+std::size_t InputFile::Room() const
+{
+    if (size >= std::numeric_limits<std::size_t>::max())
+        throw std::bad_alloc();
+    return static_cast<std::size_t>(size) + 1;
+}
+
 std::string ReadFile(std::u16string_view path)
 {
-    constexpr std::size_t step = 65536;
     InputFile file(path);
-    std::string bytes(static_cast<std::size_t>(file.Size()) + 1, '\0'); // one more, to meet the end
-    std::size_t length = 0;
-    for (;;) {
+    std::string bytes(file.Room(), '\0');
+    std::size_t length = file.Read(bytes.data(), bytes.size());
+    while (length == bytes.size()) { // it grows, or its size is not known
+        bytes.resize(bytes.size() * 2);
         length += file.Read(bytes.data() + length, bytes.size() - length);
-        if (length < bytes.size())
-            break;
-        bytes.resize(bytes.size() + bytes.size() / 2 + step);
     }
     bytes.resize(length);
     return bytes;
@@ -215,14 +225,14 @@ std::string ReadFile(std::u16string_view path)
 
 void WriteFileAtomically(std::u16string_view path, std::string_view bytes)
 {
-    const std::string name = CheckedName(path);
-    const std::string target = TargetOf(name);
+    const std::string target = TargetOf(CheckedName(path));
     struct stat old = {};
     const bool isThere = stat(target.c_str(), &old) == 0;
-    const bool isDevice = isThere && !S_ISREG(old.st_mode) && !S_ISDIR(old.st_mode); // or a pipe: not to be replaced
-    const bool isDone = isDevice ? WriteDirectly(target, bytes) : Replace(target, bytes, isThere ? &old : nullptr);
-    if (!isDone)
-        ThrowSystemError(errno, name);
+    const bool isDevice = isThere && !S_ISREG(old.st_mode) && !S_ISDIR(old.st_mode);
+    if (isDevice) // or a pipe: not to be replaced by a file
+        FileHandle(target, O_WRONLY).Write(bytes);
+    else
+        Replace(target, bytes, isThere ? &old : nullptr);
 }
 
 } // namespace varnex3::xml

@@ -27,6 +27,10 @@ public:
     // What the system says its size is; a file may turn out to be shorter or longer.
     std::uint64_t Size() const { return size; }
 
+    // Memory to read it into: its size and one more, so that one call meets the end. std::bad_alloc when there is no
+    // such memory.
+    std::size_t Room() const;
+
     // Reads up to `count` bytes, fewer only at the end of the file.
     std::size_t Read(char* to, std::size_t count);
 

@@ -66,7 +66,7 @@ public:
     }
 
     // A name of an element or attribute, with or without prefix.
-    const Char* Name(const Char* p, bool& hasPrefix)
+    [[gnu::always_inline]] const Char* Name(const Char* p, bool& hasPrefix)
     {
         if (IsAsciiLetter(*p) || *p == '_') {
             const Char* after = SkipNameCharacters(p);
@@ -79,7 +79,7 @@ public:
     }
 
     // Character data up to the next "<". It needs decoding when it has references or carriage returns.
-    const Char* Text(const Char* p, bool& needsDecoding)
+    [[gnu::always_inline]] const Char* Text(const Char* p, bool& needsDecoding)
     {
         for (;;) {
             p = SkipPlainText(p);

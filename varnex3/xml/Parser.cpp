@@ -15,6 +15,7 @@ namespace {
 
 // A guess at how much text makes a node; what is too much is given back.
 constexpr std::size_t charactersPerNode = 24;
+constexpr std::size_t mostNodesGuessed = 4'000'000;
 
 template <class Char>
 class Parser
@@ -22,22 +23,18 @@ class Parser
 public:
     using View = std::basic_string_view<Char>;
 
-    Parser(Tree<Char>& into, View parsedText) : tree(into), lexer(parsedText), check(into, lexer) {}
+    Parser(TextBuffer<Char> text, std::size_t offset)
+        : tree(std::move(text)), lexer(tree.text.View().substr(offset)), check(tree, lexer)
+    {}
+    Tree<Char> TakeTree() { return std::move(tree); }
 
     bool Run()
     {
-        tree.nodes.Reserve(static_cast<std::size_t>(lexer.end - lexer.begin) / charactersPerNode + 8);
-        tree.nodes.Append({.parent = 0,
-                           .name = 0,
-                           .text = 0,
-                           .extent = 0,
-                           .firstAttribute = 0,
-                           .nameLength = 0,
-                           .type = NodeType::Document,
-                           .flags = 0});
+        tree.nodes.Reserve(std::min(Length(lexer.begin, lexer.end) / charactersPerNode, mostNodesGuessed) + 8);
+        tree.nodes.Append(NewNode(NodeType::Document));
         if (!Document(lexer.begin))
             return false;
-        tree.nodes[documentIndex].extent = static_cast<NodeIndex>(tree.nodes.Size());
+        tree.nodes[documentIndex].extent = NodeCount();
         tree.nodes.Shrink();
         tree.attributes.Shrink();
         return true;
@@ -100,7 +97,7 @@ private:
     // ---- elements
 
     // What comes next inside an element.
-    const Char* Content(const Char* p)
+    [[gnu::always_inline]] const Char* Content(const Char* p)
     {
         p = Text(p);
         if (p == nullptr)
@@ -117,24 +114,54 @@ private:
         }
     }
 
-    const Char* StartTag(const Char* p)
+    [[gnu::always_inline]] const Char* StartTag(const Char* p)
     {
         bool hasPrefix = false;
         const Char* name = p + 1;
-        p = lexer.Name(name, hasPrefix);
-        if (p == nullptr)
+        const Char* nameEnd = lexer.Name(name, hasPrefix);
+        if (nameEnd == nullptr)
+            return nullptr;
+        if (*nameEnd != '>' || hasPrefix)
+            return LongStartTag(name, nameEnd, hasPrefix);
+        if (!IsBlank(nameEnd[1]))
+            if (const Char* after = Leaf(name, nameEnd); after != nullptr)
+                return after;
+        Open(name, nameEnd);
+        return nameEnd + 1;
+    }
+
+    // <A>text</A> or <A></A>, most elements of a message, in one go. nullptr when it is anything else: the element is
+    // then taken again, piece by piece.
+    [[gnu::always_inline]] const Char* Leaf(const Char* name, const Char* nameEnd)
+    {
+        bool needsDecoding = false;
+        const Char* text = nameEnd + 1;
+        const Char* textEnd = lexer.Text(text, needsDecoding);
+        if (textEnd == nullptr || textEnd[1] != '/')
+            return nullptr;
+        const std::size_t length = Length(name, nameEnd);
+        if (!SameCharacters(textEnd + 2, name, length) || textEnd[2 + length] != '>')
             return nullptr;
 
-        const NodeIndex element = Append(NodeType::Element);
-        SetName(tree.nodes[element], name, p);
-        if (*p != '>') {
-            p = Attributes(p, element);
-            if (p == nullptr)
-                return nullptr;
+        TreeNode node = NewElement(name, nameEnd);
+        if (textEnd != text) {
+            SetContent(node, text, textEnd, needsDecoding);
+            node.flags |= HasTextInside;
+        } else {
+            node.extent = NodeCount() + 1;
         }
-        if (hasPrefix && !check.ElementName(element))
+        tree.nodes.Append(node);
+        return textEnd + length + 3;
+    }
+
+    // A start tag with attributes, a prefix or "/>".
+    [[gnu::noinline]] const Char* LongStartTag(const Char* name, const Char* nameEnd, bool hasPrefix)
+    {
+        Open(name, nameEnd);
+        const Char* p = *nameEnd != '>' ? Attributes(nameEnd) : nameEnd;
+        if (p == nullptr || (hasPrefix && !check.ElementName(current)))
             return nullptr;
-        current = element;
+        inherited = tree.nodes[current].flags & PreservesSpace;
         return *p == '>' ? p + 1 : EmptyTag(p);
     }
 
@@ -142,12 +169,14 @@ private:
     const Char* EmptyTag(const Char* p)
     {
         p = lexer.Expect(p + 1, ">", ErrorCode::InvalidMarkup, "The %c stands between '/' and '>'");
+        if (p == nullptr)
+            return nullptr;
         tree.nodes[current].flags |= IsEmptyTag;
         Close();
         return p;
     }
 
-    const Char* EndTag(const Char* p)
+    [[gnu::always_inline]] const Char* EndTag(const Char* p)
     {
         const View name = tree.Name(current);
         const Char* after = p + 2 + name.size();
@@ -178,46 +207,51 @@ private:
                           tree.Name(current));
     }
 
+    void Open(const Char* name, const Char* nameEnd)
+    {
+        const NodeIndex element = NodeCount();
+        tree.nodes.Append(NewElement(name, nameEnd));
+        current = element;
+    }
+
     void Close()
     {
         TreeNode& element = tree.nodes[current];
         if (!element.Is(HasTextInside))
-            element.extent = static_cast<NodeIndex>(tree.nodes.Size());
+            element.extent = NodeCount();
         check.Leave(current);
         current = element.parent;
+        inherited = tree.nodes[current].flags & PreservesSpace;
     }
 
     // ---- attributes
 
     // From behind the element's name to the ">" or "/" that ends the list.
-    [[gnu::noinline]] const Char* Attributes(const Char* p, NodeIndex element)
+    const Char* Attributes(const Char* p)
     {
         const std::size_t first = tree.attributes.Size();
         bool hasPrefixes = false;
-        for (;;) {
-            const Char* next = SkipBlanks(p);
-            if (*next == '>' || *next == '/') {
-                p = next;
-                break;
-            }
+        for (const Char* next = SkipBlanks(p); *next != '>' && *next != '/'; next = SkipBlanks(p)) {
             if (next == p)
-                return first == tree.attributes.Size()
-                           ? lexer.Unexpected(ErrorCode::InvalidName, p, "The %c is not allowed in a name")
-                           : lexer.Unexpected(ErrorCode::InvalidAttribute, p, "The %c follows a value without a blank");
-            p = Attribute(next, element, hasPrefixes);
+                return NoBlank(p, first == tree.attributes.Size());
+            p = Attribute(next, hasPrefixes);
             if (p == nullptr)
                 return nullptr;
         }
-        return EndAttributes(element, first, hasPrefixes) ? p : nullptr;
+        return EndAttributes(first, hasPrefixes) ? SkipBlanks(p) : nullptr;
     }
 
-    const Char* Attribute(const Char* name, NodeIndex element, bool& hasPrefixes)
+    std::nullptr_t NoBlank(const Char* p, bool isAfterName)
+    {
+        return isAfterName ? lexer.Unexpected(ErrorCode::InvalidName, p, "The %c is not allowed in a name")
+                           : lexer.Unexpected(ErrorCode::InvalidAttribute, p, "The %c follows a value without a blank");
+    }
+
+    const Char* Attribute(const Char* name, bool& hasPrefixes)
     {
         bool hasPrefix = false;
         const Char* nameEnd = lexer.Name(name, hasPrefix);
-        if (nameEnd == nullptr)
-            return nullptr;
-        const Char* quote = Quote(nameEnd);
+        const Char* quote = nameEnd != nullptr ? Quote(nameEnd) : nullptr;
         if (quote == nullptr)
             return nullptr;
         bool needsDecoding = false;
@@ -233,7 +267,7 @@ private:
                                                                  .isLast = false});
         hasPrefixes |= hasPrefix || IsNamespaceDeclaration(View(name, Length(name, nameEnd)));
         if (hasPrefix)
-            NoteSpace(attribute, element);
+            NoteSpace(attribute);
         return valueEnd + 1;
     }
 
@@ -249,39 +283,39 @@ private:
         return p;
     }
 
-    bool EndAttributes(NodeIndex element, std::size_t first, bool hasPrefixes)
+    bool EndAttributes(std::size_t first, bool hasPrefixes)
     {
         const std::size_t count = tree.attributes.Size() - first;
         if (count == 0)
             return true;
-        tree.nodes[element].flags |= HasAttributes;
-        tree.nodes[element].firstAttribute = static_cast<std::uint32_t>(first);
+        tree.nodes[current].flags |= HasAttributes;
+        tree.nodes[current].firstAttribute = static_cast<std::uint32_t>(first);
         tree.attributes.Back().isLast = true;
-        return (count == 1 && !hasPrefixes) || check.Attributes(element, first, hasPrefixes);
+        return (count == 1 && !hasPrefixes) || check.Attributes(current, first, hasPrefixes);
     }
 
     // xml:space; other values than the two are as good as none.
-    void NoteSpace(const TreeAttribute& attribute, NodeIndex element)
+    void NoteSpace(const TreeAttribute& attribute)
     {
         if (!IsText(tree.AttributeName(attribute), "xml:space"))
             return;
         std::u16string value;
         tree.AppendValue(value, attribute);
-        std::uint8_t& flags = tree.nodes[element].flags;
+        std::uint8_t& flags = tree.nodes[current].flags;
         if (value == u"preserve")
             flags |= PreservesSpace | HasSpaceAttribute;
         else if (value == u"default")
             flags = static_cast<std::uint8_t>((flags & ~PreservesSpace) | HasSpaceAttribute);
     }
 
-    // ---- the rest
+    // ---- text and the other markup
 
     // Up to the next "<".
-    const Char* Text(const Char* p)
+    [[gnu::always_inline]] const Char* Text(const Char* p)
     {
         if (IsBlank(*p)) {
             const Char* next = SkipBlanks(p);
-            if (*next == '<' && !tree.nodes[current].Is(PreservesSpace))
+            if (*next == '<' && inherited == 0)
                 return next;
         }
         bool needsDecoding = false;
@@ -293,9 +327,11 @@ private:
 
     void AppendText(const Char* p, const Char* after, bool needsDecoding)
     {
-        const bool isOnlyChild = after[1] == '/' && tree.nodes.Size() == std::size_t{current} + 1;
-        tree.nodes[current].flags |= isOnlyChild ? HasTextInside : IsMixed;
-        SetContent(tree.nodes[isOnlyChild ? current : Append(NodeType::Text)], p, after, needsDecoding);
+        const bool isOnlyChild = after[1] == '/' && NodeCount() == current + 1;
+        if (!isOnlyChild)
+            return AppendNode(NodeType::Text, p, after, needsDecoding);
+        SetContent(tree.nodes[current], p, after, needsDecoding);
+        tree.nodes[current].flags |= HasTextInside;
     }
 
     const Char* Exclamation(const Char* p)
@@ -321,7 +357,7 @@ private:
         const Char* after = lexer.Find(content, "--", needsDecoding);
         if (after == nullptr)
             return nullptr;
-        SetContent(tree.nodes[Append(NodeType::Comment)], content, after, needsDecoding);
+        AppendNode(NodeType::Comment, content, after, needsDecoding);
         return lexer.Expect(after + 2, ">", ErrorCode::InvalidComment, "The characters '--' stand in a comment");
     }
 
@@ -337,8 +373,7 @@ private:
         const Char* after = lexer.Find(content, "]]>", needsDecoding);
         if (after == nullptr)
             return nullptr;
-        tree.nodes[current].flags |= IsMixed;
-        SetContent(tree.nodes[Append(NodeType::CData)], content, after, needsDecoding);
+        AppendNode(NodeType::CData, content, after, needsDecoding);
         return after + 3;
     }
 
@@ -356,9 +391,8 @@ private:
         const Char* after = lexer.Find(content, "?>", needsDecoding);
         if (after == nullptr)
             return nullptr;
-        TreeNode& node = tree.nodes[Append(NodeType::Instruction)];
-        SetName(node, target, targetEnd);
-        SetContent(node, content, after, needsDecoding);
+        AppendNode(NodeType::Instruction, content, after, needsDecoding);
+        SetName(tree.nodes.Back(), target, targetEnd);
         return after + 2;
     }
 
@@ -388,19 +422,32 @@ private:
 
     // ---- nodes
 
-    NodeIndex Append(NodeType type)
+    NodeIndex NodeCount() const { return static_cast<NodeIndex>(tree.nodes.Size()); }
+
+    TreeNode NewNode(NodeType type) const
     {
-        const auto index = static_cast<NodeIndex>(tree.nodes.Size());
-        const auto inherited = static_cast<std::uint8_t>(tree.nodes[current].flags & PreservesSpace);
-        tree.nodes.Append({.parent = current,
-                           .name = 0,
-                           .text = 0,
-                           .extent = 0,
-                           .firstAttribute = 0,
-                           .nameLength = 0,
-                           .type = type,
-                           .flags = inherited});
-        return index;
+        return {.parent = current,
+                .name = 0,
+                .text = 0,
+                .extent = 0,
+                .firstAttribute = 0,
+                .nameLength = 0,
+                .type = type,
+                .flags = inherited};
+    }
+
+    TreeNode NewElement(const Char* name, const Char* nameEnd) const
+    {
+        TreeNode node = NewNode(NodeType::Element);
+        SetName(node, name, nameEnd);
+        return node;
+    }
+
+    void AppendNode(NodeType type, const Char* content, const Char* after, bool needsDecoding)
+    {
+        if (type == NodeType::Text || type == NodeType::CData)
+            tree.nodes[current].flags |= IsMixed;
+        SetContent(tree.nodes.Append(NewNode(type)), content, after, needsDecoding);
     }
 
     void SetName(TreeNode& node, const Char* name, const Char* after) const
@@ -438,10 +485,11 @@ private:
         return fault;
     }
 
-    Tree<Char>& tree;
+    Tree<Char> tree;
     Lexer<Char> lexer;
     AttributeCheck<Char> check;
     NodeIndex current = documentIndex; // the innermost open element
+    std::uint8_t inherited = 0;        // the flags its children start with
     bool hasRoot = false;
     bool hasDoctype = false;
 };
@@ -451,9 +499,11 @@ private:
 template <class Char>
 ParseError Parse(TextBuffer<Char> text, std::size_t offset, Tree<Char>& into)
 {
-    into = Tree<Char>(std::move(text));
-    Parser<Char> parser(into, into.text.View().substr(offset));
-    return parser.Run() ? ParseError{} : parser.Error();
+    Parser<Char> parser(std::move(text), offset);
+    if (!parser.Run())
+        return parser.Error();
+    into = parser.TakeTree();
+    return {};
 }
 
 template ParseError Parse(TextBuffer<char>, std::size_t, Tree<char>&);

@@ -1,5 +1,9 @@
-// The loops that look at every character: how far a run of plain ones goes. Sixteen at a time where the processor has
-// SSE2, one at a time elsewhere. The text must be followed by `padding` zeros: they end every run.
+// The loops that look at every character: how far a run of plain ones goes. The text must be followed by `padding`
+// zeros: they end every run.
+//
+// Texts differ in length, so they are searched sixteen characters at a time where the processor has SSE2. Names and
+// white space repeat themselves: the processor foresees a plain loop over them and need not wait for its outcome, which
+// measured a fifth faster than blocks.
 #pragma once
 
 #include <array>
@@ -24,6 +28,8 @@ namespace detail {
 
 #ifdef VARNEX3_XML_SSE2
 
+// ---- sixteen characters at a time
+
 inline constexpr int blockSize = 16;
 
 inline __m128i LoadBlock(const void* p) { return _mm_loadu_si128(static_cast<const __m128i*>(p)); }
@@ -37,11 +43,6 @@ inline __m128i Equal(__m128i block, char c) { return _mm_cmpeq_epi8(block, _mm_s
 inline __m128i AtMost(__m128i block, char limit)
 {
     return _mm_cmpeq_epi8(_mm_min_epu8(block, _mm_set1_epi8(limit)), block);
-}
-
-inline __m128i Between(__m128i block, char first, char last)
-{
-    return AtMost(_mm_sub_epi8(block, _mm_set1_epi8(first)), static_cast<char>(last - first));
 }
 
 template <class... Blocks>
@@ -73,20 +74,21 @@ inline bool CopyAsciiBlock(const char16_t* from, char* to)
     return true;
 }
 
-// One bit for each of the sixteen characters that is in the class, or is not.
+// One bit for each of the sixteen characters that is in the class.
 inline std::uint32_t Bits(__m128i isInClass) { return static_cast<std::uint32_t>(_mm_movemask_epi8(isInClass)); }
-inline std::uint32_t OtherBits(__m128i isInClass) { return Bits(isInClass) ^ 0xFFFFu; }
 
 // Where the first block with a stop has it.
 template <class Char, class Stops>
-const Char* FindStop(const Char* p, Stops stops)
+[[gnu::always_inline]] inline const Char* FindStop(const Char* p, Stops stops)
 {
     for (;; p += blockSize)
         if (const std::uint32_t bits = stops(LoadCharacters(p)); bits != 0)
             return p + std::countr_zero(bits);
 }
 
-#else
+#endif
+
+// ---- one character at a time
 
 enum CharacterClass : std::uint8_t
 {
@@ -115,20 +117,18 @@ inline constexpr auto classTable = [] {
 }();
 
 template <class Char>
-const Char* SkipClass(const Char* p, CharacterClass wanted)
+[[gnu::always_inline]] inline const Char* SkipClass(const Char* p, CharacterClass wanted)
 {
     while (Unit(*p) < classTable.size() && (classTable[Unit(*p)] & wanted) != 0)
         ++p;
     return p;
 }
 
-#endif
-
 } // namespace detail
 
 // The first character that is "<", "&", "]", below U+0020 or beyond ASCII.
 template <class Char>
-const Char* SkipPlainText(const Char* p)
+[[gnu::always_inline]] inline const Char* SkipPlainText(const Char* p)
 {
 #ifdef VARNEX3_XML_SSE2
     using namespace detail;
@@ -142,7 +142,7 @@ const Char* SkipPlainText(const Char* p)
 
 // The first character that is "<", "&", the quote, below U+0020 or beyond ASCII; perhaps the other quote.
 template <class Char>
-const Char* SkipPlainValue(const Char* p, [[maybe_unused]] Char quote)
+[[gnu::always_inline]] inline const Char* SkipPlainValue(const Char* p, [[maybe_unused]] Char quote)
 {
 #ifdef VARNEX3_XML_SSE2
     using namespace detail;
@@ -156,35 +156,27 @@ const Char* SkipPlainValue(const Char* p, [[maybe_unused]] Char quote)
 
 // The first character that is no ASCII letter, digit, "-", "." or "_".
 template <class Char>
-const Char* SkipNameCharacters(const Char* p)
+[[gnu::always_inline]] inline const Char* SkipNameCharacters(const Char* p)
 {
-#ifdef VARNEX3_XML_SSE2
-    using namespace detail;
-    return FindStop(p, [](__m128i b) {
-        const __m128i lower = _mm_or_si128(b, _mm_set1_epi8(0x20));
-        return OtherBits(AnyOf(Between(lower, 'a', 'z'), Between(b, '0', '9'), Between(b, '-', '.'), Equal(b, '_')));
-    });
-#else
     return detail::SkipClass(p, detail::InName);
-#endif
 }
 
-// The first character that is not white space.
+// The first character that is not white space. Most white space is a line end and TABs.
 template <class Char>
-const Char* SkipBlanks(const Char* p)
+[[gnu::always_inline]] inline const Char* SkipBlanks(const Char* p)
 {
-#ifdef VARNEX3_XML_SSE2
-    using namespace detail;
-    return FindStop(
-        p, [](__m128i b) { return OtherBits(AnyOf(Equal(b, ' '), Equal(b, '\t'), Equal(b, '\r'), Equal(b, '\n'))); });
-#else
-    return detail::SkipClass(p, detail::Blank);
-#endif
+    if (*p == '\r' && p[1] == '\n')
+        p += 2;
+    while (*p == '\t')
+        ++p;
+    while (IsBlank(*p))
+        ++p;
+    return p;
 }
 
 // Whether two padded texts begin with the same `count` characters.
 template <class Char>
-bool SameCharacters(const Char* left, const Char* right, std::size_t count)
+[[gnu::always_inline]] inline bool SameCharacters(const Char* left, const Char* right, std::size_t count)
 {
 #ifdef VARNEX3_XML_SSE2
     using namespace detail;
@@ -193,7 +185,7 @@ bool SameCharacters(const Char* left, const Char* right, std::size_t count)
         if (Bits(_mm_cmpeq_epi8(LoadBlock(left), LoadBlock(right))) != 0xFFFFu)
             return false;
     const std::uint32_t wanted = (1u << (count * sizeof(Char))) - 1;
-    return (OtherBits(_mm_cmpeq_epi8(LoadBlock(left), LoadBlock(right))) & wanted) == 0;
+    return (~Bits(_mm_cmpeq_epi8(LoadBlock(left), LoadBlock(right))) & wanted) == 0;
 #else
     return std::memcmp(left, right, count * sizeof(Char)) == 0;
 #endif

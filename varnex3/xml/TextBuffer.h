@@ -30,8 +30,8 @@ public:
     std::size_t Size() const { return size; }
     std::basic_string_view<Char> View() const { return {characters.get(), size}; }
 
-    // Makes it shorter.
-    void Resize(std::size_t length)
+    // Gives up what is behind the first `length` characters.
+    void Shorten(std::size_t length)
     {
         size = length;
         Terminate();

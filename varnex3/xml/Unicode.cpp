@@ -26,16 +26,6 @@ const From* CopyAscii(const From* from, const From* end, To*& to)
     return from;
 }
 
-char16_t* Put(char16_t* to, char32_t c)
-{
-    if (c >= 0x10000) {
-        *to++ = static_cast<char16_t>(0xD800 + ((c - 0x10000) >> 10));
-        c = 0xDC00 + ((c - 0x10000) & 0x3FF);
-    }
-    *to++ = static_cast<char16_t>(c);
-    return to;
-}
-
 // The bytes of a malformed sequence that one replacement stands for: the start of a sequence as far as it is one.
 std::size_t MalformedLength(const char* p, const char* end)
 {
@@ -66,7 +56,7 @@ void AppendUtf16(std::u16string& to, std::string_view utf8)
         if (p == end)
             break;
         const CodePoint point = DecodePoint(p, end, true);
-        out = Put(out, point.length != 0 ? point.value : replacement);
+        out = PutPoint(out, point.length != 0 ? point.value : replacement);
         p += point.length != 0 ? point.length : MalformedLength(p, end);
     }
     to.resize(static_cast<std::size_t>(out - to.data()));
