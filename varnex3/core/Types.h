@@ -126,8 +126,7 @@ struct FromVariant<Ref<T>>
     {
         const Ref<Record>* const record = std::get_if<Ref<Record>>(&value);
         if (!record)
-            throw Error(ErrorNumber::ObjectRequired, {},
-                        u"an object of class " + ToText(T::ClassName) + u" is required");
+            throw Error(ErrorNumber::TypeMismatch, {}, u"an object of class " + ToText(T::ClassName) + u" is required");
         if (*record && &(*record)->Class() != &T::Info())
             throw Error(ErrorNumber::TypeMismatch, {},
                         u"an object of class " + ToText((*record)->Class().name) + u" is not a "
