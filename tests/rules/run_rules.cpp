@@ -1,7 +1,7 @@
 // Runs the rules of this folder's JSON files through the interface by name, the way every face does.
 //
-//     run_rules tests/rules                    all files
-//     run_rules tests/rules SourceDef          the files whose name begins so
+//     varnex3_rules tests/rules              all files
+//     varnex3_rules tests/rules SourceDef    the files whose name begins so
 //
 // README.md describes the files.
 #include <unistd.h>
@@ -418,7 +418,7 @@ std::string FaultOf(const Json& vector, const fs::path& messages)
 int main(int argc, char** argv)
 {
     if (argc < 2) {
-        std::cerr << "usage: run_rules FOLDER [NAME...]\n";
+        std::cerr << "usage: varnex3_rules FOLDER [NAME...]\n";
         return 2;
     }
     const fs::path folder = argv[1];

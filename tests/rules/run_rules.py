@@ -1,8 +1,8 @@
 #!/usr/bin/env python3
 """Runs the rules of this folder's JSON files through the Python package.
 
-    PYTHONPATH=build/python tests/rules/run_rules.py              all files
-    PYTHONPATH=build/python tests/rules/run_rules.py SourceDef    the files whose name begins so
+    PYTHONPATH=build/python tests/rules/run_rules.py tests/rules              all files
+    PYTHONPATH=build/python tests/rules/run_rules.py tests/rules SourceDef    the files whose name begins so
 
 README.md describes the files.
 """
@@ -20,8 +20,6 @@ from typing import Any, Callable
 
 import varnex3
 
-RULES = pathlib.Path(__file__).parent
-MESSAGES = RULES.parent / "messages"
 KINDS = ("nothing", "text", "double", "date", "16-bit integer", "32-bit integer", "Boolean", "object", "enumeration",
          "variant")
 ABSENT = ({"nothing": True}, None)  # both are None here
@@ -78,7 +76,8 @@ def member_words(member: Any) -> str:
 
 
 class Rule:
-    def __init__(self) -> None:
+    def __init__(self, messages: pathlib.Path) -> None:
+        self.messages = messages
         self.objects: dict[str, Any] = {}
         self.folders: dict[str, tempfile.TemporaryDirectory[str]] = {}
         self.turn = ""
@@ -106,7 +105,7 @@ class Rule:
         if isinstance(value, str):
             return self.filled(value)
         if "file" in value:
-            return (MESSAGES / value["file"]).read_bytes().decode()
+            return (self.messages / value["file"]).read_bytes().decode()
         return "".join(self.filled(line) + "\r\n" for line in value["lines"])
 
     def argument(self, value: Any) -> Any:
@@ -234,9 +233,9 @@ class Rule:
             raise Failure(f"expected no file {self.filled(path)}")
 
 
-def fault_of(vector: dict[str, Any]) -> str:
+def fault_of(vector: dict[str, Any], messages: pathlib.Path) -> str:
     """What is wrong with a rule; nothing when it holds."""
-    rule = Rule()
+    rule = Rule(messages)
     step: Any = vector["rule"]
     try:
         for step in vector["steps"]:
@@ -249,13 +248,17 @@ def fault_of(vector: dict[str, Any]) -> str:
         rule.close()
 
 
-def main(names: list[str]) -> int:
+def main(arguments: list[str]) -> int:
+    if not arguments:
+        print("usage: run_rules.py FOLDER [NAME...]", file=sys.stderr)
+        return 2
+    folder, names = pathlib.Path(arguments[0]), tuple(arguments[1:])
     passed = failed = 0
-    for file in sorted(RULES.glob("*.json")):
-        if names and not file.name.startswith(tuple(names)):
+    for file in sorted(folder.glob("*.json")):
+        if names and not file.name.startswith(names):
             continue
         for vector in json.loads(file.read_text(encoding="utf-8")):
-            fault = fault_of(vector)
+            fault = fault_of(vector, folder.parent / "messages")
             if fault:
                 failed += 1
                 print(f"{file.name}: {vector['rule']}: {fault}")
