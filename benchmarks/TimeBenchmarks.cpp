@@ -12,6 +12,7 @@
 
 #include "FolderReading.h"
 #include "Parsers.h"
+#include "varnex3/inbox/Xalo_Messages.h"
 #include "varnex3/xml/Files.h"
 #include "varnex3/xml/Unicode.h"
 
@@ -42,8 +43,19 @@ void RegisterParsers(const std::string& folder, int items)
     Register("parse/expat" + size, ParseWithExpat, text);
 }
 
-void RegisterFolderReading(const std::string& folder)
+bool ParseInbox(const std::u16string& folder)
 {
+    const auto messages = varnex3::New<varnex3::Xalo_Messages>();
+    return messages->ParseFiles(folder) && messages->Count() > 0;
+}
+
+void RegisterInbox(const std::string& folder)
+{
+    benchmark::RegisterBenchmark("inbox/varnex3", [path = varnex3::xml::ToUtf16(folder)](benchmark::State& state) {
+        for (auto _ : state)
+            if (!ParseInbox(path))
+                return state.SkipWithError("the folder was not read");
+    });
     benchmark::RegisterBenchmark("inbox/files-only", [folder](benchmark::State& state) {
         for (auto _ : state)
             benchmark::DoNotOptimize(ReadEveryFile(folder));
@@ -71,7 +83,7 @@ int main(int argc, char** argv)
     const std::string folder = argv[1];
     for (const int items : {5, 50, 500, 5000})
         RegisterParsers(folder, items);
-    RegisterFolderReading(folder + "/inbox");
+    RegisterInbox(folder + "/inbox");
     benchmark::RunSpecifiedBenchmarks();
     return 0;
 }
