@@ -15,6 +15,22 @@ using Json = nlohmann::ordered_json;
 
 Json JsonOf(Record& record);
 
+constexpr bool IsHighSurrogate(char16_t c) { return c >= 0xD800 && c <= 0xDBFF; }
+constexpr bool IsLowSurrogate(char16_t c) { return c >= 0xDC00 && c <= 0xDFFF; }
+
+// The text with U+FFFD for every lone surrogate.
+Text WithoutLoneSurrogates(Text text)
+{
+    for (std::size_t i = 0; i < text.size(); ++i) {
+        const bool isPair = IsHighSurrogate(text[i]) && i + 1 < text.size() && IsLowSurrogate(text[i + 1]);
+        if (isPair)
+            ++i;
+        else if (IsHighSurrogate(text[i]) || IsLowSurrogate(text[i]))
+            text[i] = u'\uFFFD';
+    }
+    return text;
+}
+
 Json JsonOf(const EnumInfo& enumeration, std::int32_t value)
 {
     const auto found = std::ranges::find(enumeration.values, value, &Enumerator::value);
@@ -26,7 +42,7 @@ struct ToJsonValue
     const Type& type;
 
     Json operator()(EmptyValue) const { return nullptr; }
-    Json operator()(const Text& text) const { return ToUtf8(text); }
+    Json operator()(const Text& text) const { return ToUtf8(WithoutLoneSurrogates(text)); }
     Json operator()(Date date) const { return ToUtf8(FormatDate(date, 1)); }
     Json operator()(const Ref<Record>& child) const { return child ? JsonOf(*child) : Json(nullptr); }
     Json operator()(std::int32_t value) const
@@ -65,6 +81,6 @@ Json JsonOf(Record& record)
 
 } // namespace
 
-std::string ToJson(Record& record) { return JsonOf(record).dump(-1, ' ', false, Json::error_handler_t::replace); }
+std::string ToJson(Record& record) { return JsonOf(record).dump(); }
 
 } // namespace varnex3

@@ -1,0 +1,139 @@
+#include "varnex3/core/XmlSection.h"
+
+#include <random>
+
+#include "tests/Printing.h"
+#include "varnex3/core/CustomerDef.h"
+#include "varnex3/core/modGeneral.h"
+
+using namespace varnex3;
+using tests::RaisedBy;
+
+namespace {
+
+xml::Document Loaded(TextView text)
+{
+    xml::Document document;
+    document.LoadText(text);
+    return document;
+}
+
+// A section that is the whole of a text.
+struct TextSection
+{
+    xml::Document document;
+    XmlSection section;
+    explicit TextSection(TextView text) : document(Loaded(text)), section(document.DocumentElement(), "ReaderDef") {}
+    const XmlSection* operator->() const { return &section; }
+};
+
+} // namespace
+
+TEST_CASE("GetNodeValue: the text of the first element on the path; Empty when there is none")
+{
+    const xml::Document document = Loaded(u"<A><B> x </B><B>y</B><C/></A>");
+    CHECK(ToText(GetNodeValue(document.Root(), u"A/B")) == u" x ");
+    CHECK(std::get<Text>(GetNodeValue(document.Root(), u"A/C")) == u"");
+    CHECK(IsEmpty(GetNodeValue(document.Root(), u"A/D")));
+    CHECK(IsEmpty(GetNodeValue(document.Root(), u"B")));
+    CHECK(IsEmpty(GetNodeValue(Loaded(u"<A").Root(), u"A")));
+}
+
+TEST_CASE("GetNodeValue: an absent element converts to the empty text, 0 and the zero date")
+{
+    const Variant absent = GetNodeValue(Loaded(u"<A/>").Root(), u"A/B");
+    CHECK(ToText(absent) == u"");
+    CHECK(ToDouble(absent) == 0);
+    CHECK(ToInt32(absent) == 0);
+    CHECK(ToDate(absent) == Date{});
+    CHECK_FALSE(ToBoolean(absent));
+}
+
+TEST_CASE("GetNodeXML: start tag, content and end tag of the first element; the empty text when there is none")
+{
+    const xml::Document document = Loaded(u"<A><B a=\"1\">x &amp; y</B><B/></A>");
+    CHECK(std::get<Text>(GetNodeXML(document.Root(), u"A/B")) == u"<B a=\"1\">x &amp; y</B>");
+    CHECK(std::get<Text>(GetNodeXML(document.Root(), u"A/C")) == u"");
+}
+
+TEST_CASE("TextAt: absent gives the empty text; RequiredTextAt raises on behalf of the reader")
+{
+    const TextSection a(u"<A><B>x</B></A>");
+    CHECK(a->TextAt("A/B") == u"x");
+    CHECK(a->TextAt("A/C") == u"");
+    CHECK(a->TextAt("X/B") == u"");
+    CHECK(a->RequiredTextAt("A/B") == u"x");
+    CHECK(RaisedBy([&] { a->RequiredTextAt("A/C"); }) == "91 ReaderDef.ParseXML");
+}
+
+TEST_CASE("NumberAt and Int32At: absent gives 0; what is no number raises, the element named")
+{
+    const TextSection a(u"<A><B>1.5</B><C>x</C><D/></A>");
+    CHECK(a->NumberAt("A/B") == 1.5);
+    CHECK(a->Int32At("A/B") == 2);
+    CHECK(a->NumberAt("A/X") == 0);
+    CHECK(a->Int32At("A/X") == 0);
+    CHECK(RaisedBy([&] { a->NumberAt("A/C"); }) == "13 ReaderDef.ParseXML");
+    CHECK(RaisedBy([&] { a->NumberAt("A/D"); }) == "13 ReaderDef.ParseXML");
+    try {
+        a->Int32At("A/C");
+    } catch (const Error& error) {
+        CHECK(error.Description() == u"C: 'x' is not a number");
+    }
+}
+
+TEST_CASE("ElementsNamed: at any depth, in document order, the section's own element included")
+{
+    CHECK(TextSection(u"<A><B>1</B><C><B>2<B>3</B></B></C></A>")->ElementsNamed("B").size() == 3);
+    CHECK(TextSection(u"<B><B/></B>")->ElementsNamed("B").size() == 2);
+    CHECK(TextSection(u"<A/>")->ElementsNamed("B").empty());
+    CHECK(TextSection(u"no xml")->ElementsNamed("B").empty());
+}
+
+TEST_CASE("FirstAttributeOf: the first one written, namespace declarations not counted; without one an error")
+{
+    const TextSection a(u"<A><B xmlns:n=\"urn:n\" z=\"1\" a=\"2\"/><B xmlns=\"urn:n\"/></A>");
+    const xml::NodeList found = a->ElementsNamed("B");
+    CHECK(a->FirstAttributeOf(found[0]) == u"1");
+    CHECK(RaisedBy([&] { a->FirstAttributeOf(found[1]); }) == "91 ReaderDef.ParseXML");
+}
+
+TEST_CASE("A section that a child reads in place reads as its own text loaded again")
+{
+    // Pieces that make the difference, if there is one: white space, xml:space, prefixes, comments, CDATA, references.
+    const Text pieces[] = {u"<Title>Ms</Title>",
+                           u"<Forname> </Forname>",
+                           u"<Surname>&#32;</Surname>",
+                           u"<Surname xml:space=\"preserve\">\t</Surname>",
+                           u"<Forname xml:space=\"default\"> \r\n </Forname>",
+                           u"<HomePhone><![CDATA[ ]]></HomePhone>",
+                           u"<Title>a<!-- b -->c<?d e?><f>g</f></Title>",
+                           u"<p:Surname>x</p:Surname>",
+                           u"<Title p:a=\"1\">&lt;&amp;&#xD;&#xA;</Title>",
+                           u"\r\n\t ",
+                           u"text &gt; ",
+                           u"<!-- comment -->",
+                           u"<PersonalName><Surname>deeper</Surname></PersonalName>",
+                           u"<Surname>]]&gt; é€\U0001F600</Surname>"};
+    std::mt19937 random(3);
+    const auto pick = [&] { return pieces[random() % std::size(pieces)]; };
+    for (int i = 0; i < 2000; ++i) {
+        const Text space = random() % 3 == 0 ? u" xml:space=\"preserve\"" : u"";
+        const Text text = u"<Customer xmlns:p=\"urn:p\"" + space + u">" + pick() + u"<PersonalName>" + pick() + pick()
+                          + pick() + u"</PersonalName>" + pick() + u"</Customer>";
+        CAPTURE(text);
+        const xml::Document document = Loaded(text);
+        REQUIRE(document.Root());
+
+        const auto customer = New<CustomerDef>();
+        customer->ParseXML(text);
+        const auto again = New<PersonalNameDef>();
+        again->ParseXML(ToText(GetNodeXML(document.Root(), u"Customer/PersonalName")));
+
+        const auto name = customer->PersonalName();
+        CHECK(name->Title() == again->Title());
+        CHECK(name->Forname() == again->Forname());
+        CHECK(name->Surname() == again->Surname());
+        CHECK(name->HomePhone() == again->HomePhone());
+    }
+}

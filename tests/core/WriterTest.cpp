@@ -1,0 +1,178 @@
+#include "varnex3/core/XmlWriter.h"
+
+#include <functional>
+
+#include "tests/Printing.h"
+#include "varnex3/core/ClaimHeaderDef.h"
+#include "varnex3/core/CustomerDef.h"
+#include "varnex3/core/PersonalNameDef.h"
+
+using namespace varnex3;
+using tests::RaisedBy;
+
+namespace {
+
+template <int Level>
+struct Written
+{
+    static constexpr int kLevel = Level;
+    std::function<void(XmlWriter&)> write;
+    void Write(XmlWriter& xml) const { write(xml); }
+};
+
+// What a record at this level writes.
+template <int Level = 1>
+Text TextOf(const std::function<void(XmlWriter&)>& write)
+{
+    return XmlWriter::TextOf(Written<Level>{write});
+}
+
+} // namespace
+
+TEST_CASE("XmlWriter: a group's tags stand at its level, its lines one level deeper")
+{
+    CHECK(TextOf([](XmlWriter& xml) {
+              xml.Open("A");
+              xml.Always("B", u"x");
+              xml.Open("C");
+              xml.Always("D", u"");
+              xml.Close("C");
+              xml.Close("A");
+          })
+          == u"\t<A>\r\n\t\t<B>x</B>\r\n\t\t<C>\r\n\t\t\t<D></D>\r\n\t\t</C>\r\n\t</A>\r\n");
+    CHECK(TextOf<0>([](XmlWriter& xml) { xml.Always("A", u"x"); }) == u"<A>x</A>\r\n");
+    CHECK(TextOf<3>([](XmlWriter& xml) { xml.Always("A", u"x"); }) == u"\t\t\t<A>x</A>\r\n");
+}
+
+TEST_CASE("XmlWriter: nothing written is the empty text")
+{
+    CHECK(TextOf([](XmlWriter&) {}) == u"");
+}
+
+TEST_CASE("XmlWriter: values are written as they are")
+{
+    CHECK(TextOf([](XmlWriter& xml) { xml.Always("A", u"<&>\r\n"); }) == u"\t<A><&>\r\n</A>\r\n");
+    CHECK(TextOf([](XmlWriter& xml) { xml.Always("A", TextView(u"\xD800\0x", 3)); })
+          == u"\t<A>" + Text(u"\xD800\0x", 3) + u"</A>\r\n");
+}
+
+TEST_CASE("XmlWriter: Always writes dates as yyyy-mm-dd, amounts with two decimals, integers in plain decimal")
+{
+    CHECK(TextOf([](XmlWriter& xml) {
+              xml.Always("A", *DateFrom(CivilDate{2004, 3, 15, 14, 5, 9}));
+          })
+          == u"\t<A>2004-03-15</A>\r\n");
+    CHECK(TextOf([](XmlWriter& xml) { xml.Always("A", Date{}); }) == u"\t<A>1899-12-30</A>\r\n");
+    CHECK(TextOf([](XmlWriter& xml) { xml.Always("A", 1234.5); }) == u"\t<A>1234.50</A>\r\n");
+    CHECK(TextOf([](XmlWriter& xml) { xml.Always("A", std::int32_t{-1234}); }) == u"\t<A>-1234</A>\r\n");
+}
+
+TEST_CASE("XmlWriter: an amount or a date that cannot be written raises")
+{
+    CHECK(RaisedBy([] { TextOf([](XmlWriter& xml) { xml.Always("A", 1e308 * 10); }); }).starts_with("6"));
+    CHECK(RaisedBy([] { TextOf([](XmlWriter& xml) { xml.Always("A", Date{1e9}); }); }).starts_with("6"));
+}
+
+TEST_CASE("XmlWriter: IfSet leaves out the empty text and the zero date, and nothing else")
+{
+    CHECK(TextOf([](XmlWriter& xml) { xml.IfSet("A", u""); }) == u"");
+    CHECK(TextOf([](XmlWriter& xml) { xml.IfSet("A", Date{}); }) == u"");
+    CHECK(TextOf([](XmlWriter& xml) { xml.IfSet("A", u" "); }) == u"\t<A> </A>\r\n");
+    CHECK(TextOf([](XmlWriter& xml) { xml.IfSet("A", Date{0.5}); }) == u"\t<A>1899-12-30</A>\r\n");
+}
+
+TEST_CASE("XmlWriter: a line with an attribute is written whatever the values, and neither is escaped")
+{
+    CHECK(TextOf([](XmlWriter& xml) { xml.AlwaysWithAttribute("A", "FieldName", u"B\"<", u"x&"); })
+          == u"\t<A FieldName=\"B\"<\">x&</A>\r\n");
+    CHECK(TextOf([](XmlWriter& xml) { xml.AlwaysWithAttribute("A", "FieldName", u"", u""); })
+          == u"\t<A FieldName=\"\"></A>\r\n");
+}
+
+TEST_CASE("XmlWriter: a group that nothing is written inside is taken back")
+{
+    const auto group = [](XmlWriter& xml, TextView inside) {
+        xml.Always("Before", u"1");
+        const XmlWriter::Mark mark = xml.OpenUnlessEmpty("Group");
+        xml.IfSet("Inside", inside);
+        xml.CloseUnlessEmpty(mark);
+        xml.Always("After", u"2");
+    };
+    CHECK(TextOf([&](XmlWriter& xml) { group(xml, u""); }) == u"\t<Before>1</Before>\r\n\t<After>2</After>\r\n");
+    CHECK(TextOf([&](XmlWriter& xml) { group(xml, u"x"); })
+          == u"\t<Before>1</Before>\r\n\t<Group>\r\n\t\t<Inside>x</Inside>\r\n\t</Group>\r\n\t<After>2</After>\r\n");
+}
+
+TEST_CASE("XmlWriter: groups that are taken back may stand inside each other")
+{
+    CHECK(TextOf([](XmlWriter& xml) {
+              const XmlWriter::Mark outer = xml.OpenUnlessEmpty("Outer");
+              const XmlWriter::Mark inner = xml.OpenUnlessEmpty("Inner");
+              xml.CloseUnlessEmpty(inner);
+              xml.CloseUnlessEmpty(outer);
+              xml.Always("A", u"");
+          })
+          == u"\t<A></A>\r\n");
+}
+
+TEST_CASE("XmlWriter: a text of any length is whole, also where the first room ends")
+{
+    std::int32_t wrong = 0;
+    for (std::size_t length = 0; length < 5000; ++length) {
+        const Text value(length, u'x');
+        const Text text = TextOf([&](XmlWriter& xml) { xml.Always("A", value); });
+        wrong += text != u"\t<A>" + value + u"</A>\r\n";
+    }
+    CHECK(wrong == 0);
+}
+
+TEST_CASE("XmlWriter: a group that is taken back where the first room ends leaves nothing")
+{
+    std::int32_t wrong = 0;
+    for (std::size_t length = 1990; length < 2060; ++length) {
+        const Text value(length, u'x');
+        const Text text = TextOf([&](XmlWriter& xml) {
+            xml.Always("A", value);
+            xml.CloseUnlessEmpty(xml.OpenUnlessEmpty("Group"));
+            xml.Always("B", u"y");
+        });
+        wrong += text != u"\t<A>" + value + u"</A>\r\n\t<B>y</B>\r\n";
+    }
+    CHECK(wrong == 0);
+}
+
+TEST_CASE("XmlWriter: a child stands at its own class's level, whatever stands around it")
+{
+    Child<ClaimHeaderDef> claim;
+    claim->VehicleID(u"V");
+    Child<PersonalNameDef> name;
+    name->Surname(u"S");
+    CHECK(
+        TextOf<0>([&](XmlWriter& xml) {
+            xml.Open("Root");
+            xml.Append(claim);
+            xml.Append(name);
+            xml.Always("A", u"");
+            xml.Close("Root");
+        })
+        == u"<Root>\r\n\t<ClaimHeader>\r\n\t\t<VehicleID>V</VehicleID>\r\n\t\t<ReinstatementNo>0</ReinstatementNo>\r\n"
+           u"\t</ClaimHeader>\r\n\t\t<PersonalName>\r\n\t\t\t<Surname>S</Surname>\r\n\t\t</PersonalName>\r\n"
+           u"\t<A></A>\r\n</Root>\r\n");
+}
+
+TEST_CASE("XmlWriter: Writes tells whether a child would write anything")
+{
+    Child<PersonalNameDef> name;
+    CHECK_FALSE(XmlWriter::Writes(name));
+    name->HomePhone(u"1");
+    CHECK(XmlWriter::Writes(name));
+}
+
+TEST_CASE("Serialise: twice the same text, and nothing in the record changes")
+{
+    const auto customer = New<CustomerDef>();
+    customer->PersonalName()->Title(Text(3000, u'&'));
+    const Text first = customer->Serialise();
+    CHECK(customer->Serialise() == first);
+    CHECK(first.size() > 15000);
+}
