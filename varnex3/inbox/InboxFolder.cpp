@@ -43,6 +43,15 @@ struct CloseFolder
     void operator()(DIR* directory) const { closedir(directory); }
 };
 
+bool IsFolder(const Text& path)
+{
+    if (path.find(u'\0') != Text::npos) // the system would look at what stands before it
+        return false;
+    struct stat status
+    {};
+    return stat(xml::NativePath(path).c_str(), &status) == 0 && S_ISDIR(status.st_mode);
+}
+
 // The text behind the last full stop is xml.
 bool HasMessageExtension(std::string_view name)
 {
@@ -66,18 +75,11 @@ bool IsFile(int folder, const dirent& entry)
 
 } // namespace
 
-bool InboxFolder::Exists(const Text& path)
+InboxFolder::InboxFolder(const Text& path_) : path(path_)
 {
-    if (path.find(u'\0') != Text::npos) // the system would look at what stands before it
-        return false;
-    struct stat status
-    {};
-    return stat(xml::NativePath(path).c_str(), &status) == 0 && S_ISDIR(status.st_mode);
-}
-
-InboxFolder::InboxFolder(const Text& path_)
-    : path(path_), folder(open(xml::NativePath(path).c_str(), O_RDONLY | O_DIRECTORY | O_CLOEXEC))
-{
+    if (!IsFolder(path))
+        Raise(ErrorNumber::FolderMissing, kOperation, u"Folder '" + path + u"' does not exist.");
+    folder = open(xml::NativePath(path).c_str(), O_RDONLY | O_DIRECTORY | O_CLOEXEC);
     if (folder < 0)
         throw FileError(errno, kOperation, path);
 }

@@ -19,9 +19,7 @@ public:
         std::string nativeName; // as the system has it
     };
 
-    static bool Exists(const Text& path);
-
-    // Raises when the folder cannot be read.
+    // Raises FolderMissing when there is no such folder, another error when it cannot be read.
     explicit InboxFolder(const Text& path);
     ~InboxFolder();
     InboxFolder(const InboxFolder&) = delete;

@@ -120,6 +120,14 @@ void MessageDef::Adopt(xml::Document loaded, const Text& fileName, const Text& f
     bSourceIsCurrent = false;
 }
 
+void MessageDef::AdoptFile(xml::Document loaded, const Text& fileName, const Text& filePath)
+{
+    if (loaded.Root())
+        Adopt(std::move(loaded), fileName, filePath);
+    else
+        ParseXML({}, fileName, filePath);
+}
+
 void MessageDef::Summarise()
 {
     sMessageNo = ValueAt(eMessageTypeID == Xalo_Error ? "RelatesToMessageNo" : "MessageNo");

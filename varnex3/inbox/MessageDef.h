@@ -59,6 +59,10 @@ public:
     // Precondition: it is not empty.
     void Adopt(xml::Document loaded, const Text& fileName, const Text& filePath);
 
+    // The same for what was loaded from a file. A file that is not well-formed reads as an empty text: the summary
+    // then tells of that one's failure, whatever the file's own; the document's error has the true one.
+    void AdoptFile(xml::Document loaded, const Text& fileName, const Text& filePath);
+
 private:
     Text ValueAt(Name path) const;
     void Summarise();

@@ -8,22 +8,16 @@ VARNEX_DEFINE(Xalo_Messages);
 
 bool Xalo_Messages::ParseFiles(const Text& sFolderPath, std::int32_t* ErrorNo, Text* ErrorMessage)
 {
-    const auto fail = [&](std::int32_t number, Text description) {
-        if (ErrorNo)
-            *ErrorNo = number;
-        if (ErrorMessage)
-            *ErrorMessage = std::move(description);
-        return false;
-    };
-    if (!InboxFolder::Exists(sFolderPath))
-        return fail(static_cast<std::int32_t>(ErrorNumber::FolderMissing),
-                    u"Folder '" + sFolderPath + u"' does not exist.");
     try {
         AddFiles(sFolderPath);
         return true;
     } catch (...) {
         const Error error = CurrentError("Xalo_Messages.ParseFiles");
-        return fail(error.Number(), error.Description());
+        if (ErrorNo)
+            *ErrorNo = error.Number();
+        if (ErrorMessage)
+            *ErrorMessage = error.Description();
+        return false;
     }
 }
 
@@ -32,12 +26,8 @@ void Xalo_Messages::AddFiles(const Text& folder)
     InboxFolder inbox(folder);
     for (const InboxFolder::File& file : inbox.MessageFiles()) {
         xml::Document document;
-        const bool isWellFormed = inbox.Load(file, document);
-        const Ref<MessageDef> message = Add(file.name); // before its content is looked at: every file gets an entry
-        if (isWellFormed)
-            message->Adopt(std::move(document), file.name, inbox.PathOf(file));
-        else
-            message->ParseXML({}, file.name, inbox.PathOf(file)); // a broken file reads as an empty document
+        inbox.Load(file, document);
+        Add(file.name)->AdoptFile(std::move(document), file.name, inbox.PathOf(file)); // every file gets an entry
     }
 }
 
