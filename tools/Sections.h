@@ -1,0 +1,23 @@
+// The sections of a message, each read by the record class it belongs to.
+#pragma once
+
+#include <optional>
+#include <vector>
+
+#include "varnex3/core/Error.h"
+#include "varnex3/core/Interface.h"
+#include "varnex3/xml/Document.h"
+
+namespace varnex3::tool {
+
+struct Section
+{
+    Name element;
+    Ref<Record> record;         // with what was read before an error
+    std::optional<Error> error; // why the class could not read all of it
+};
+
+// Those sections below the root element that there is a class for, in the order in which messages have them.
+std::vector<Section> ReadSections(const xml::Document& document);
+
+} // namespace varnex3::tool

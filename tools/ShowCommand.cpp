@@ -1,0 +1,106 @@
+#include "ShowCommand.h"
+
+#include <algorithm>
+#include <nlohmann/json.hpp>
+#include <system_error>
+
+#include "DisplayText.h"
+#include "MessageFile.h"
+#include "RecordTree.h"
+#include "Sections.h"
+#include "SourceExcerpt.h"
+#include "Summary.h"
+#include "varnex3/core/Json.h"
+#include "varnex3/xml/Files.h"
+
+namespace varnex3::tool {
+
+namespace {
+
+using Json = nlohmann::ordered_json;
+
+void PrintFault(Terminal& terminal, const MessageFile& file, std::string_view bytes)
+{
+    const std::string number = std::to_string(file.fault.line);
+    const std::string gutter = std::string(number.size(), ' ') + " | ";
+    const std::size_t width = terminal.Width() - std::min(terminal.Width() - 1, gutter.size());
+    const SourceExcerpt excerpt = ExcerptAt(bytes, file.fault, width);
+    terminal.Paragraph(FindingOf(file, file.message->FilePath()), 4);
+    terminal.Line();
+    terminal.Line(number + " | " + excerpt.text);
+    terminal.Line(gutter + std::string(excerpt.caret, ' ') + terminal.Styled(Style::Bad, "^"));
+}
+
+void PrintSummary(Terminal& terminal, MessageDef& message)
+{
+    PrintField(terminal, 0, "File", Printable(message.FileName()));
+    for (const SummaryField& field : SummaryFields())
+        if (const Text value = ValueOf(message, field.property); !value.empty())
+            PrintField(terminal, 0, field.label, Printable(value));
+}
+
+void PrintSection(Terminal& terminal, const Section& section)
+{
+    terminal.Line();
+    terminal.Line(terminal.Styled(Style::Heading, section.element));
+    PrintRecord(terminal, 1, *section.record);
+    if (section.error)
+        for (const std::string& line : Wrapped(Printable(ToUtf16(section.error->what())), terminal.Width() - 2))
+            terminal.Line("  " + terminal.Styled(Style::Bad, line));
+}
+
+Json JsonOf(const Error& error)
+{
+    return {{"number", error.Number()}, {"source", ToUtf8(error.Source())}, {"reason", ToUtf8(error.Description())}};
+}
+
+Json JsonOf(const std::vector<Section>& sections)
+{
+    Json json = Json::object();
+    for (const Section& section : sections) {
+        Json& record = json[std::string(section.element)] = Json::parse(ToJson(*section.record));
+        if (section.error)
+            record["error"] = JsonOf(*section.error);
+    }
+    return json;
+}
+
+std::string ReadBytes(const Text& path)
+{
+    try {
+        return xml::ReadFile(path);
+    } catch (const std::system_error& error) {
+        throw FileError(error.code().value(), "show", path);
+    }
+}
+
+Text FileNameIn(const Text& path) { return path.substr(path.rfind(u'/') + 1); }
+
+} // namespace
+
+Status Show(const ShowOptions& options, const Console& console)
+{
+    const Text path = xml::FromNativePath(options.file);
+    const std::string bytes = ReadBytes(path);
+    xml::Document document;
+    document.LoadBytes(bytes);
+    const std::vector<Section> sections = ReadSections(document);
+    const MessageFile file(std::move(document), FileNameIn(path), path);
+
+    if (options.isJson) {
+        Json json = tool::JsonOf(file);
+        json["sections"] = JsonOf(sections);
+        console.out.Line(JsonLine(json));
+    } else if (file.IsBroken()) {
+        PrintFault(console.out, file, bytes);
+    } else {
+        PrintSummary(console.out, *file.message);
+        for (const Section& section : sections)
+            PrintSection(console.out, section);
+    }
+    const bool isRead =
+        std::ranges::none_of(sections, [](const Section& section) { return section.error.has_value(); });
+    return file.IsFine() && isRead ? Status::Fine : Status::Findings;
+}
+
+} // namespace varnex3::tool
