@@ -4,7 +4,8 @@
     tests/compile_fail/check.py SOURCE_DIR COMPILER
 
 Each file beside this one holds one mistake and begins with the words of the diagnostic: `// expect: ...`, with ` | `
-between them where compilers word it differently. With defined the same file is correct and must compile, so that it fails for its mistake alone.
+between them where compilers word it differently. With VARNEX3_CORRECT defined the same file is correct and must
+compile, so that it fails for its mistake alone.
 """
 
 from __future__ import annotations
