@@ -73,6 +73,14 @@ bool IsFile(int folder, const dirent& entry)
     return fstatat(folder, entry.d_name, &status, 0) != 0 || S_ISREG(status.st_mode);
 }
 
+// What the system says; a file that grows meanwhile is read whole all the same.
+std::size_t SizeOf(int file)
+{
+    struct stat status
+    {};
+    return fstat(file, &status) == 0 && status.st_size > 0 ? static_cast<std::size_t>(status.st_size) : 0;
+}
+
 } // namespace
 
 InboxFolder::InboxFolder(const Text& path_) : path(path_)
@@ -115,9 +123,10 @@ bool InboxFolder::Load(const File& file, xml::Document& document)
     if (opened.get() < 0)
         throw FileError(errno, kOperation, PathOf(file));
 
-    constexpr std::size_t kFirstRoom = std::size_t{1} << 16;
-    if (bytes.size() < kFirstRoom)
-        bytes.resize(kFirstRoom);
+    constexpr std::size_t kLeastRoom = std::size_t{1} << 16;
+    const std::size_t room = std::max(kLeastRoom, SizeOf(opened.get()) + 1); // one more: to see that nothing follows
+    if (bytes.size() < room)
+        bytes.resize(room);
     std::size_t size = 0;
     while (true) {
         const ssize_t count = read(opened.get(), bytes.data() + size, bytes.size() - size);
