@@ -44,11 +44,12 @@ std::string CheckedName(std::u16string_view path)
     return name;
 }
 
+// An open file. Its errors name the file that the caller asked for.
 class FileHandle
 {
 public:
-    FileHandle(const std::string& fileName, int flags, mode_t mode = 0)
-        : name(fileName), number(open(name.c_str(), flags | O_CLOEXEC, mode))
+    FileHandle(const std::string& opened, const std::string& askedFor, int flags, mode_t mode = 0)
+        : name(askedFor), number(open(opened.c_str(), flags | O_CLOEXEC, mode))
     {
         Check(number >= 0, name);
     }
@@ -91,12 +92,14 @@ std::string NewTemporaryName(const std::string& folder)
     return folder + ".varnex3-" + std::to_string(getpid()) + "-" + std::to_string(counter++) + ".tmp";
 }
 
-// A file that goes away again unless it takes the place of another.
+// A file beside the target that goes away again unless it takes its place.
 class TemporaryFile
 {
 public:
-    explicit TemporaryFile(const std::string& folder)
-        : name(NewTemporaryName(folder)), file(name, O_WRONLY | O_CREAT | O_EXCL, 0666)
+    explicit TemporaryFile(const std::string& targetFile)
+        : target(targetFile),
+          name(NewTemporaryName(FolderOf(target))),
+          file(name, target, O_WRONLY | O_CREAT | O_EXCL, 0666)
     {}
     ~TemporaryFile()
     {
@@ -106,21 +109,22 @@ public:
     TemporaryFile(const TemporaryFile&) = delete;
     TemporaryFile& operator=(const TemporaryFile&) = delete;
 
-    void TakeMode(mode_t mode) { Check(fchmod(file.Number(), mode & 07777) == 0, name); }
+    void TakeMode(mode_t mode) { Check(fchmod(file.Number(), mode & 07777) == 0, target); }
 
     void Write(std::string_view bytes)
     {
         file.Write(bytes);
-        Check(fsync(file.Number()) == 0, name);
+        Check(fsync(file.Number()) == 0, target);
     }
 
-    void MoveTo(const std::string& target)
+    void TakeTargetsPlace()
     {
         isMoved = rename(name.c_str(), target.c_str()) == 0;
         Check(isMoved, target);
     }
 
 private:
+    std::string target;
     std::string name;
     FileHandle file;
     bool isMoved = false;
@@ -138,13 +142,12 @@ void SyncFolder(const std::string& folder)
 
 void Replace(const std::string& target, std::string_view bytes, const struct stat* old)
 {
-    const std::string folder = FolderOf(target);
-    TemporaryFile temporary(folder);
+    TemporaryFile temporary(target);
     if (old != nullptr)
         temporary.TakeMode(old->st_mode);
     temporary.Write(bytes);
-    temporary.MoveTo(target);
-    SyncFolder(folder);
+    temporary.TakeTargetsPlace();
+    SyncFolder(FolderOf(target));
 }
 
 } // namespace
@@ -230,7 +233,7 @@ void WriteFileAtomically(std::u16string_view path, std::string_view bytes)
     const bool isThere = stat(target.c_str(), &old) == 0;
     const bool isDevice = isThere && !S_ISREG(old.st_mode) && !S_ISDIR(old.st_mode);
     if (isDevice) // or a pipe: not to be replaced by a file
-        FileHandle(target, O_WRONLY).Write(bytes);
+        FileHandle(target, target, O_WRONLY).Write(bytes);
     else
         Replace(target, bytes, isThere ? &old : nullptr);
 }

@@ -87,6 +87,8 @@ public:
     // The index after the last descendant of a node.
     NodeIndex End(NodeIndex at) const
     {
+        if (IsInnerText(at))
+            return at + 1;
         const TreeNode& node = nodes[at];
         const bool hasDescendants = node.type <= NodeType::Element && !node.Is(HasTextInside);
         return hasDescendants ? node.extent : at + 1;
