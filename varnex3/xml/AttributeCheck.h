@@ -22,7 +22,7 @@ public:
     // Checks the attributes of an element from this one on, the last there are. False once a fault is noted.
     bool Attributes(NodeIndex element, std::size_t first, bool hasPrefixes);
 
-    // Checks the name of an element whose attributes are checked.
+    // Checks the name, with a prefix, of an element whose attributes are checked.
     bool ElementName(NodeIndex element);
 
     // To be called at the end of every element.
@@ -57,11 +57,6 @@ private:
     bool AreDifferentByHash(std::size_t first);
     bool FailDuplicate(std::size_t attribute);
 
-    static bool Is(View text, std::string_view ascii)
-    {
-        return text.size() == ascii.size() && Lexer<Char>::StartsWith(text.data(), ascii.data());
-    }
-
     Tree<Char>& tree;
     Lexer<Char>& lexer;
     NamespaceScope<Char> scope;
@@ -85,7 +80,7 @@ bool AttributeCheck<Char>::ElementName(NodeIndex element)
 {
     ExpandedName expanded{};
     const View name = tree.Name(element);
-    if (name.substr(0, name.find(Char{':'})) == View(name.data(), 5) && Is(name.substr(0, 5), "xmlns"))
+    if (EqualsAscii(name.substr(0, name.find(Char{':'})), "xmlns"))
         return lexer.FailFalse(ErrorCode::ReservedPrefix, name.data(),
                                "The prefix 'xmlns' cannot be used for an element");
     return Expand(name, expanded);
@@ -107,12 +102,12 @@ bool AttributeCheck<Char>::Declare(NodeIndex element, std::size_t attribute)
 template <class Char>
 bool AttributeCheck<Char>::IsAllowed(View prefix, std::uint32_t uri, const Char* at)
 {
-    const bool isXml = Is(prefix, "xml");
+    const bool isXml = EqualsAscii(prefix, "xml");
     if (isXml != (uri == xmlUri))
         return lexer.FailFalse(ErrorCode::ReservedPrefix, at,
                                isXml ? "The prefix 'xml' cannot be bound to another namespace"
                                      : "The namespace of 'xml' cannot be bound to another prefix");
-    if (Is(prefix, "xmlns") || uri == xmlnsUri)
+    if (EqualsAscii(prefix, "xmlns") || uri == xmlnsUri)
         return lexer.FailFalse(ErrorCode::ReservedPrefix, at,
                                "The prefix 'xmlns' and its namespace cannot be declared");
     if (uri == noUri && !prefix.empty())
@@ -137,9 +132,9 @@ std::uint32_t AttributeCheck<Char>::UriNumber(const TreeAttribute& attribute)
 template <class Char>
 std::uint32_t AttributeCheck<Char>::UriOfPrefix(View prefix) const
 {
-    if (Is(prefix, "xml"))
+    if (EqualsAscii(prefix, "xml"))
         return xmlUri;
-    if (Is(prefix, "xmlns"))
+    if (EqualsAscii(prefix, "xmlns"))
         return xmlnsUri;
     const std::uint32_t binding = scope.Find(prefix);
     return binding == scope.none ? unknownUri : scope[binding].uri;

@@ -4,6 +4,7 @@
 #include <cstddef>
 #include <cstdint>
 #include <string>
+#include <string_view>
 
 namespace varnex3::xml {
 
@@ -27,6 +28,17 @@ template <class Char>
 constexpr bool IsAsciiLetter(Char c)
 {
     return (c >= 'a' && c <= 'z') || (c >= 'A' && c <= 'Z');
+}
+
+template <class Char>
+constexpr bool EqualsAscii(std::basic_string_view<Char> text, std::string_view ascii)
+{
+    if (text.size() != ascii.size())
+        return false;
+    for (std::size_t i = 0; i < ascii.size(); ++i)
+        if (text[i] != static_cast<Char>(ascii[i]))
+            return false;
+    return true;
 }
 
 constexpr bool IsHighSurrogate(char32_t c) { return c >= 0xD800 && c <= 0xDBFF; }

@@ -18,8 +18,7 @@ public:
     // Whether a text starts with an XML declaration, well-formed or not.
     static bool StartsIn(View text)
     {
-        static constexpr Char opening[] = {'<', '?', 'x', 'm', 'l'};
-        if (text.substr(0, 5) != View(opening, 5))
+        if (!EqualsAscii(text.substr(0, 5), "<?xml"))
             return false;
         return text.size() == 5 || !IsNameCharacter(Unit(text[5])); // <?xml-stylesheet is an instruction
     }
@@ -45,7 +44,6 @@ private:
             sentence = reason;
     }
 
-    static bool Is(View text, std::string_view ascii);
     static bool IsVersion(View value);
     static bool IsEncodingName(View value);
 
@@ -66,8 +64,8 @@ void Declaration<Char>::Read()
         return Fail("The XML declaration has an encoding that is no name");
     facts.isPresent = true;
     facts.hasStandalone = Take("standalone", standalone);
-    facts.isStandalone = Is(standalone, "yes");
-    if (facts.hasStandalone && !facts.isStandalone && !Is(standalone, "no"))
+    facts.isStandalone = EqualsAscii(standalone, "yes");
+    if (facts.hasStandalone && !facts.isStandalone && !EqualsAscii(standalone, "no"))
         return Fail("The XML declaration says neither standalone=\"yes\" nor \"no\"");
     SkipBlanks();
     if (sentence == nullptr && !Skip("?>"))
@@ -114,27 +112,16 @@ bool Declaration<Char>::SkipBlanks()
 template <class Char>
 bool Declaration<Char>::Skip(std::string_view ascii)
 {
-    if (!Is(rest.substr(0, ascii.size()), ascii))
+    if (!EqualsAscii(rest.substr(0, ascii.size()), ascii))
         return false;
     rest.remove_prefix(ascii.size());
     return true;
 }
 
 template <class Char>
-bool Declaration<Char>::Is(View text, std::string_view ascii)
-{
-    if (text.size() != ascii.size())
-        return false;
-    for (std::size_t i = 0; i < ascii.size(); ++i)
-        if (text[i] != static_cast<Char>(ascii[i]))
-            return false;
-    return true;
-}
-
-template <class Char>
 bool Declaration<Char>::IsVersion(View value)
 {
-    if (value.size() < 3 || !Is(value.substr(0, 2), "1."))
+    if (value.size() < 3 || !EqualsAscii(value.substr(0, 2), "1."))
         return false;
     for (const Char c : value.substr(2))
         if (!IsDigit(c))

@@ -68,9 +68,10 @@ public:
     // instructions skipped, CDATA included, nothing trimmed. The content of a text, comment or instruction node.
     std::u16string Text() const;
 
-    // The node as markup that loads again to the same node. Elements that hold only elements are laid out one to a
-    // line, indented with TABs, ended with CR LF; the markup itself has no line end before or after it. Prefixes that
-    // are declared further up are declared again on the node.
+    // The node as markup that loads again to the same node, its texts and values with the references and quotes they
+    // were written with. Elements that hold only elements are laid out one to a line, indented with TABs, ended with
+    // CR LF (100 levels down; deeper ones stay on their line); the markup itself has no line end before or after it.
+    // Prefixes that are declared further up are declared again on the node.
     std::u16string Xml() const;
 
     // Comments and instructions are nodes too; dropped white space is not.
@@ -96,7 +97,7 @@ public:
     NodeList Select(std::string_view path) const;
 
     // Every element below this node with this tag name, in document order. "Parent/Child" finds each Child whose
-    // parent is a Parent, at any depth.
+    // parent is a Parent, at any depth; this node itself may be that parent.
     NodeList ElementsByTagName(std::string_view name) const;
 
 private:
@@ -143,7 +144,7 @@ public:
     NodeList ElementsByTagName(std::string_view name) const { return Root().ElementsByTagName(name); }
 
     // The whole document as text: its XML declaration when it had one, without encoding, then every node as Node::Xml
-    // writes it, each ended with CR LF. Loading the text gives the same document. u"" for an empty document.
+    // writes it, each ended with CR LF; no DOCTYPE. Loading the text gives the same document. u"" for an empty one.
     std::u16string Xml() const;
 
     // Saves as UTF-8, atomically; a declaration says so. Throws std::system_error. Precondition: not empty.

@@ -32,7 +32,7 @@ Place PlaceOf(const Char* at, std::basic_string_view<Char> text)
     return place;
 }
 
-// Where the fault lies between CR and LF the column counts the CR, as an editor does not; nothing reports there.
+// A name as a sentence has it: not all of a very long one.
 template <class Char>
 std::u16string Quote(std::basic_string_view<Char> name)
 {

@@ -182,12 +182,9 @@ private:
         const Char* after = p + 2 + name.size();
         if (!SameCharacters(p + 2, name.data(), name.size()) || (*after != '>' && !IsBlank(*after)))
             return Mismatch(p + 2);
-        if (*after != '>') {
-            after = lexer.Expect(SkipBlanks(after), ">", ErrorCode::InvalidMarkup, "The %c stands in an end tag");
-            if (after == nullptr)
-                return nullptr;
-            --after;
-        }
+        after = SkipBlanks(after);
+        if (*after != '>')
+            return lexer.Unexpected(ErrorCode::InvalidMarkup, after, "The %c stands in an end tag");
         Close();
         return after + 1;
     }
@@ -297,7 +294,7 @@ private:
     // xml:space; other values than the two are as good as none.
     void NoteSpace(const TreeAttribute& attribute)
     {
-        if (!IsText(tree.AttributeName(attribute), "xml:space"))
+        if (!EqualsAscii(tree.AttributeName(attribute), "xml:space"))
             return;
         std::u16string value;
         tree.AppendValue(value, attribute);
@@ -404,7 +401,7 @@ private:
             return lexer.Unexpected(ErrorCode::InvalidInstruction, p, "A processing instruction cannot start with %c");
         if (target.find(Char{':'}) != View::npos)
             return lexer.Fail(ErrorCode::InvalidInstruction, p, "The processing instruction '%1' has a colon", target);
-        if (IsText(target, "xml"))
+        if (EqualsAscii(target, "xml"))
             return lexer.Fail(ErrorCode::InvalidInstruction, p, "An XML declaration stands only at the very start");
         if (target.size() == 3 && (Unit(p[0]) | 0x20) == 'x' && (Unit(p[1]) | 0x20) == 'm'
             && (Unit(p[2]) | 0x20) == 'l')
@@ -470,11 +467,6 @@ private:
     {
         return static_cast<std::uint16_t>(std::min<std::size_t>(Length(p, after), Tree<Char>::longName));
     }
-    static bool IsText(View text, std::string_view ascii)
-    {
-        return text.size() == ascii.size() && Lexer<Char>::StartsWith(text.data(), ascii.data());
-    }
-
     Fault<Char> FaultInContext() const
     {
         Fault<Char> fault = lexer.fault;

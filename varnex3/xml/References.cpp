@@ -15,21 +15,10 @@ struct Entity
 constexpr Entity predefinedEntities[] = {{"lt", '<'}, {"gt", '>'}, {"amp", '&'}, {"quot", '"'}, {"apos", '\''}};
 
 template <class Char>
-bool Same(std::basic_string_view<Char> text, std::string_view ascii)
-{
-    if (text.size() != ascii.size())
-        return false;
-    for (std::size_t i = 0; i < ascii.size(); ++i)
-        if (text[i] != static_cast<Char>(ascii[i]))
-            return false;
-    return true;
-}
-
-template <class Char>
 char32_t EntityNamed(std::basic_string_view<Char> name)
 {
     for (const Entity& entity : predefinedEntities)
-        if (Same(name, entity.name))
+        if (EqualsAscii(name, entity.name))
             return entity.character;
     return 0;
 }

@@ -10,7 +10,6 @@
 #include <bit>
 #include <cstddef>
 #include <cstdint>
-#include <cstring>
 
 #include "varnex3/xml/Characters.h"
 
@@ -174,7 +173,7 @@ template <class Char>
     return p;
 }
 
-// Whether two padded texts begin with the same `count` characters.
+// Whether a padded text goes on with the `count` characters of a name.
 template <class Char>
 [[gnu::always_inline]] inline bool SameCharacters(const Char* left, const Char* right, std::size_t count)
 {
@@ -187,7 +186,9 @@ template <class Char>
     const std::uint32_t wanted = (1u << (count * sizeof(Char))) - 1;
     return (~Bits(_mm_cmpeq_epi8(LoadBlock(left), LoadBlock(right))) & wanted) == 0;
 #else
-    return std::memcmp(left, right, count * sizeof(Char)) == 0;
+    for (; count != 0 && *left == *right; ++left, ++right) // not memcmp: that may read past the zeros
+        --count;
+    return count == 0;
 #endif
 }
 

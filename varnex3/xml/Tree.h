@@ -163,9 +163,7 @@ private:
 template <class Char>
 bool IsNamespaceDeclaration(std::basic_string_view<Char> name)
 {
-    static constexpr Char xmlns[] = {'x', 'm', 'l', 'n', 's'};
-    const bool startsSo = name.substr(0, 5) == std::basic_string_view<Char>(xmlns, 5);
-    return startsSo && (name.size() == 5 || name[5] == ':');
+    return EqualsAscii(name.substr(0, 5), "xmlns") && (name.size() == 5 || name[5] == ':');
 }
 
 template <class Char>
