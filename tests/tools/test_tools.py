@@ -70,7 +70,8 @@ def json_lines(*arguments):
 class PseudoTerminal:
     """A terminal of a given width that remembers what was written to it."""
 
-    def __init__(self, columns=80):
+    def __init__(self, columns=80, delay=0.0):
+        self.delay = delay  # before it begins to read
         self.ours, self.theirs = pty.openpty()
         fcntl.ioctl(self.theirs, termios.TIOCSWINSZ, struct.pack("HHHH", 24, columns, 0, 0))
         self.written = b""
@@ -78,6 +79,7 @@ class PseudoTerminal:
         self.reader.start()
 
     def _read(self):
+        time.sleep(self.delay)
         while True:
             try:
                 chunk = os.read(self.ours, 65536)
@@ -149,6 +151,13 @@ class ScanTest(ToolTest):
         self.assertRegex(out, r"(?m)^declined\.xml +Declined Repair +403 ")
         self.assertRegex(out, r"(?m)^UPPER\.XML +Request For Quote +512  DGH88M   CL-2008-005003$")
         self.assertNotIn("ignored", out)
+
+    def test_values_stand_below_their_titles(self):
+        """scan: a value stands below its title, whether the cells before it are empty or not"""
+        titles, *rows = run("scan", str(SAMPLES)).out.split("\n\n")[0].splitlines()
+        for row in rows:
+            if "CL-" in row:
+                self.assertEqual(titles.index("Claim"), display_width(row[:row.index("CL-")]), row)
 
     def test_no_line_is_wider_than_eighty_columns_without_a_terminal(self):
         """scan: without a terminal no line takes more than 80 columns, and the table uses most of them"""
@@ -398,12 +407,13 @@ class IdentifyTest(ToolTest):
         self.assertEqual("Xalo_Image", json_lines("identify", path)[0]["MessageType"])
 
     def test_only_the_beginning_is_read(self):
-        """identify: nothing behind the first kilobytes is read, however large the file"""
-        path = self.folder / "large.xml"
-        with open(path, "wb") as file:
-            file.write(b"<Xalo_Quote>")
-            file.truncate(1 << 40)  # a terabyte that takes no room
-        self.assertEqual("Xalo_Quote", json_lines("identify", str(path))[0]["MessageType"])
+        """identify: four kilobytes are enough; nothing behind them is waited for"""
+        path = str(self.folder / "pipe.xml")
+        os.mkfifo(path)
+        writer = os.open(path, os.O_RDWR)  # held open: whoever reads on never meets the end
+        self.addCleanup(os.close, writer)
+        os.write(writer, b"<Xalo_Quote>".ljust(4096))
+        self.assertEqual("Xalo_Quote", json_lines("identify", path)[0]["MessageType"])
 
     def test_what_is_no_message_is_said_to_be_none(self):
         """identify: another root, text, nothing, an unknown encoding: no message, the reason, status 1"""
@@ -602,6 +612,13 @@ class TerminalTest(ToolTest):
             self.assertTrue(written.endswith("files\r\x1b[K"), repr(written))
             for drawn in written.split("\r\x1b[K"):
                 self.assertLess(len(drawn), columns)
+
+    def test_no_progress_among_the_lines_of_json(self):
+        """A long scan that writes JSON to the terminal shows no progress bar there"""
+        terminal = PseudoTerminal(delay=0.6)
+        subprocess.run([PROGRAM, "scan", "--json", str(SAMPLES)], stdin=subprocess.DEVNULL, stdout=terminal.theirs,
+                       stderr=terminal.theirs, env=environment(), timeout=60, check=False)
+        self.assertEqual(71, len([json.loads(line) for line in terminal.text().splitlines()]))
 
     def test_no_progress_without_a_terminal(self):
         """A long scan shows nothing on an error stream that is no terminal"""
