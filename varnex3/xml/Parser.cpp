@@ -9,6 +9,7 @@
 #include "varnex3/xml/Declaration.h"
 #include "varnex3/xml/Doctype.h"
 #include "varnex3/xml/Lexer.h"
+#include "varnex3/xml/TreeBuilder.h"
 
 namespace varnex3::xml {
 namespace {
@@ -24,19 +25,16 @@ public:
     using View = std::basic_string_view<Char>;
 
     Parser(TextBuffer<Char> text, std::size_t offset)
-        : tree(std::move(text)), lexer(tree.text.View().substr(offset)), check(tree, lexer)
+        : builder(std::move(text)), tree(builder.Built()), lexer(tree.text.View().substr(offset)), check(tree, lexer)
     {}
     Tree<Char> TakeTree() { return std::move(tree); }
 
     bool Run()
     {
-        tree.nodes.Reserve(std::min(Length(lexer.begin, lexer.end) / charactersPerNode, mostNodesGuessed) + 8);
-        tree.nodes.Append(NewNode(NodeType::Document));
+        builder.Start(std::min(Length(lexer.begin, lexer.end) / charactersPerNode, mostNodesGuessed) + 8);
         if (!Document(lexer.begin))
             return false;
-        tree.nodes[documentIndex].extent = NodeCount();
-        tree.nodes.Shrink();
-        tree.attributes.Shrink();
+        builder.Finish();
         return true;
     }
 
@@ -89,7 +87,7 @@ private:
             return lexer.Fail(ErrorCode::SecondRoot, p, "A second element stands after the root element");
         hasRoot = true;
         p = StartTag(p);
-        while (p != nullptr && current != documentIndex)
+        while (p != nullptr && builder.Current() != documentIndex)
             p = Content(p);
         return p;
     }
@@ -126,7 +124,7 @@ private:
         if (!IsBlank(nameEnd[1]))
             if (const Char* after = Leaf(name, nameEnd); after != nullptr)
                 return after;
-        Open(name, nameEnd);
+        builder.Open(name, nameEnd);
         return nameEnd + 1;
     }
 
@@ -143,25 +141,17 @@ private:
         if (!SameCharacters(textEnd + 2, name, length) || textEnd[2 + length] != '>')
             return nullptr;
 
-        TreeNode node = NewElement(name, nameEnd);
-        if (textEnd != text) {
-            SetContent(node, text, textEnd, needsDecoding);
-            node.flags |= HasTextInside;
-        } else {
-            node.extent = NodeCount() + 1;
-        }
-        tree.nodes.Append(node);
+        builder.AppendLeaf(name, nameEnd, text, textEnd, needsDecoding);
         return textEnd + length + 3;
     }
 
     // A start tag with attributes, a prefix or "/>".
     [[gnu::noinline]] const Char* LongStartTag(const Char* name, const Char* nameEnd, bool hasPrefix)
     {
-        Open(name, nameEnd);
+        builder.Open(name, nameEnd);
         const Char* p = *nameEnd != '>' ? Attributes(nameEnd) : nameEnd;
-        if (p == nullptr || (hasPrefix && !check.ElementName(current)))
+        if (p == nullptr || (hasPrefix && !check.ElementName(builder.Current())))
             return nullptr;
-        inherited = tree.nodes[current].flags & PreservesSpace;
         return *p == '>' ? p + 1 : EmptyTag(p);
     }
 
@@ -171,14 +161,14 @@ private:
         p = lexer.Expect(p + 1, ">", ErrorCode::InvalidMarkup, "The %c stands between '/' and '>'");
         if (p == nullptr)
             return nullptr;
-        tree.nodes[current].flags |= IsEmptyTag;
+        builder.MarkEmptyTag();
         Close();
         return p;
     }
 
     [[gnu::always_inline]] const Char* EndTag(const Char* p)
     {
-        const View name = tree.Name(current);
+        const View name = tree.Name(builder.Current());
         const Char* after = p + 2 + name.size();
         if (!SameCharacters(p + 2, name.data(), name.size()) || (*after != '>' && !IsBlank(*after)))
             return Mismatch(p + 2);
@@ -198,27 +188,16 @@ private:
         if (after == lexer.end)
             return lexer.Fail(ErrorCode::UnexpectedEnd, after, "");
         const View found(name, Length(name, after));
-        if (found == tree.Name(current))
+        if (found == tree.Name(builder.Current()))
             return lexer.Unexpected(ErrorCode::InvalidMarkup, after, "The %c stands in an end tag");
         return lexer.Fail(ErrorCode::TagMismatch, name, "The end tag '%1' does not match the start tag '%2'", found,
-                          tree.Name(current));
-    }
-
-    void Open(const Char* name, const Char* nameEnd)
-    {
-        const NodeIndex element = NodeCount();
-        tree.nodes.Append(NewElement(name, nameEnd));
-        current = element;
+                          tree.Name(builder.Current()));
     }
 
     void Close()
     {
-        TreeNode& element = tree.nodes[current];
-        if (!element.Is(HasTextInside))
-            element.extent = NodeCount();
-        check.Leave(current);
-        current = element.parent;
-        inherited = tree.nodes[current].flags & PreservesSpace;
+        check.Leave(builder.Current());
+        builder.Close();
     }
 
     // ---- attributes
@@ -256,15 +235,12 @@ private:
         if (valueEnd == nullptr)
             return nullptr;
 
-        const TreeAttribute& attribute = tree.attributes.Append({.name = Offset(name),
-                                                                 .value = Offset(quote + 1),
-                                                                 .valueLength = ShortLength(quote + 1, valueEnd),
-                                                                 .nameLength = NameLength(name, nameEnd),
-                                                                 .needsDecoding = needsDecoding,
-                                                                 .isLast = false});
-        hasPrefixes |= hasPrefix || IsNamespaceDeclaration(View(name, Length(name, nameEnd)));
-        if (hasPrefix)
-            NoteSpace(attribute);
+        const View attributeName(name, Length(name, nameEnd));
+        const View value(quote + 1, Length(quote + 1, valueEnd));
+        const TreeAttribute& attribute = builder.AppendAttribute(attributeName, value, needsDecoding);
+        hasPrefixes |= hasPrefix || IsNamespaceDeclaration(attributeName);
+        if (hasPrefix && EqualsAscii(attributeName, "xml:space"))
+            builder.SetSpace(attribute);
         return valueEnd + 1;
     }
 
@@ -285,24 +261,8 @@ private:
         const std::size_t count = tree.attributes.Size() - first;
         if (count == 0)
             return true;
-        tree.nodes[current].flags |= HasAttributes;
-        tree.nodes[current].firstAttribute = static_cast<std::uint32_t>(first);
-        tree.attributes.Back().isLast = true;
-        return (count == 1 && !hasPrefixes) || check.Attributes(current, first, hasPrefixes);
-    }
-
-    // xml:space; other values than the two are as good as none.
-    void NoteSpace(const TreeAttribute& attribute)
-    {
-        if (!EqualsAscii(tree.AttributeName(attribute), "xml:space"))
-            return;
-        std::u16string value;
-        tree.AppendValue(value, attribute);
-        std::uint8_t& flags = tree.nodes[current].flags;
-        if (value == u"preserve")
-            flags |= PreservesSpace | HasSpaceAttribute;
-        else if (value == u"default")
-            flags = static_cast<std::uint8_t>((flags & ~PreservesSpace) | HasSpaceAttribute);
+        builder.EndAttributes(first);
+        return (count == 1 && !hasPrefixes) || check.Attributes(builder.Current(), first, hasPrefixes);
     }
 
     // ---- text and the other markup
@@ -312,23 +272,14 @@ private:
     {
         if (IsBlank(*p)) {
             const Char* next = SkipBlanks(p);
-            if (*next == '<' && inherited == 0)
+            if (*next == '<' && !builder.PreservesBlanks())
                 return next;
         }
         bool needsDecoding = false;
         const Char* after = lexer.Text(p, needsDecoding);
         if (after != nullptr && after != p)
-            AppendText(p, after, needsDecoding);
+            builder.AppendText(p, after, needsDecoding, after[1] == '/');
         return after;
-    }
-
-    void AppendText(const Char* p, const Char* after, bool needsDecoding)
-    {
-        const bool isOnlyChild = after[1] == '/' && NodeCount() == current + 1;
-        if (!isOnlyChild)
-            return AppendNode(NodeType::Text, p, after, needsDecoding);
-        SetContent(tree.nodes[current], p, after, needsDecoding);
-        tree.nodes[current].flags |= HasTextInside;
     }
 
     const Char* Exclamation(const Char* p)
@@ -354,13 +305,13 @@ private:
         const Char* after = lexer.Find(content, "--", needsDecoding);
         if (after == nullptr)
             return nullptr;
-        AppendNode(NodeType::Comment, content, after, needsDecoding);
+        builder.AppendNode(NodeType::Comment, content, after, needsDecoding);
         return lexer.Expect(after + 2, ">", ErrorCode::InvalidComment, "The characters '--' stand in a comment");
     }
 
     const Char* CDataSection(const Char* p)
     {
-        if (current == documentIndex)
+        if (builder.Current() == documentIndex)
             return lexer.Fail(ErrorCode::TextOutsideRoot, p, "A CDATA section stands outside the root element");
         const Char* content =
             lexer.Expect(p, "<![CDATA[", ErrorCode::InvalidMarkup, "A section starts with '<![CDATA['");
@@ -370,7 +321,7 @@ private:
         const Char* after = lexer.Find(content, "]]>", needsDecoding);
         if (after == nullptr)
             return nullptr;
-        AppendNode(NodeType::CData, content, after, needsDecoding);
+        builder.AppendNode(NodeType::CData, content, after, needsDecoding);
         return after + 3;
     }
 
@@ -388,8 +339,8 @@ private:
         const Char* after = lexer.Find(content, "?>", needsDecoding);
         if (after == nullptr)
             return nullptr;
-        AppendNode(NodeType::Instruction, content, after, needsDecoding);
-        SetName(tree.nodes.Back(), target, targetEnd);
+        builder.AppendNode(NodeType::Instruction, content, after, needsDecoding);
+        builder.SetLastName(target, targetEnd);
         return after + 2;
     }
 
@@ -417,71 +368,23 @@ private:
         return Doctype<Char>(lexer).Read(p);
     }
 
-    // ---- nodes
+    // ---- the rest
 
-    NodeIndex NodeCount() const { return static_cast<NodeIndex>(tree.nodes.Size()); }
-
-    TreeNode NewNode(NodeType type) const
-    {
-        return {.parent = current,
-                .name = 0,
-                .text = 0,
-                .extent = 0,
-                .firstAttribute = 0,
-                .nameLength = 0,
-                .type = type,
-                .flags = inherited};
-    }
-
-    TreeNode NewElement(const Char* name, const Char* nameEnd) const
-    {
-        TreeNode node = NewNode(NodeType::Element);
-        SetName(node, name, nameEnd);
-        return node;
-    }
-
-    void AppendNode(NodeType type, const Char* content, const Char* after, bool needsDecoding)
-    {
-        if (type == NodeType::Text || type == NodeType::CData)
-            tree.nodes[current].flags |= IsMixed;
-        SetContent(tree.nodes.Append(NewNode(type)), content, after, needsDecoding);
-    }
-
-    void SetName(TreeNode& node, const Char* name, const Char* after) const
-    {
-        node.name = Offset(name);
-        node.nameLength = NameLength(name, after);
-    }
-
-    void SetContent(TreeNode& node, const Char* content, const Char* after, bool needsDecoding) const
-    {
-        node.text = Offset(content);
-        node.extent = ShortLength(content, after);
-        node.flags |= needsDecoding ? NeedsDecoding : 0;
-    }
-
-    std::uint32_t Offset(const Char* p) const { return ShortLength(tree.text.Data(), p); }
     static std::size_t Length(const Char* p, const Char* after) { return static_cast<std::size_t>(after - p); }
-    static std::uint32_t ShortLength(const Char* p, const Char* after) { return static_cast<std::uint32_t>(after - p); }
-    static std::uint16_t NameLength(const Char* p, const Char* after)
-    {
-        return static_cast<std::uint16_t>(std::min<std::size_t>(Length(p, after), Tree<Char>::longName));
-    }
     Fault<Char> FaultInContext() const
     {
         Fault<Char> fault = lexer.fault;
-        if (fault.code == ErrorCode::UnexpectedEnd && current != documentIndex) {
+        if (fault.code == ErrorCode::UnexpectedEnd && builder.Current() != documentIndex) {
             fault.sentence = "The text ends inside the element '%1'";
-            fault.first = tree.Name(current);
+            fault.first = tree.Name(builder.Current());
         }
         return fault;
     }
 
-    Tree<Char> tree;
+    TreeBuilder<Char> builder;
+    Tree<Char>& tree; // the one that is built
     Lexer<Char> lexer;
     AttributeCheck<Char> check;
-    NodeIndex current = documentIndex; // the innermost open element
-    std::uint8_t inherited = 0;        // the flags its children start with
     bool hasRoot = false;
     bool hasDoctype = false;
 };
