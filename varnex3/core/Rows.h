@@ -158,7 +158,7 @@ consteval auto Property(Name name, Name declaration, Name doc)
     Row<C, Get_, Put_> row{{MemberKind::Property, name, doc, TypeOf<typename S::Result>::type}};
     Describe(row, declaration, static_cast<typename S::Parameters*>(nullptr));
     row.get = [](Record* record, Arguments arguments) { return Invoke<C, Get_>(record, arguments); };
-    if constexpr (Put_ != nullptr)
+    if constexpr (!std::is_null_pointer_v<decltype(Put_)>)
         row.put = [](Record* record, Arguments arguments, const Variant& value) {
             Invoke<C, Put_>(record, arguments, &value);
         };
