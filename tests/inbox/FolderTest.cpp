@@ -175,6 +175,7 @@ TEST_CASE("An empty file gets an entry with the error of an empty document")
     expected->ParseXML(u"", u"a.xml", Text());
     CHECK(Scan(*messages, inbox.Name()) == "fine");
     CHECK(messages->MessageItems(std::int32_t{0})->ErrorMessage() == expected->ErrorMessage());
+    CHECK(expected->ErrorMessage().size() > TextView(u"File: a.xml; Error Line: 1; Error Reason: ''").size());
 }
 
 TEST_CASE("Two different faults of files have the same error text: that of an empty document")

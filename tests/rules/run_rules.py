@@ -124,8 +124,9 @@ class Rule:
 
     def compare(self, expected: Any, got: Any) -> None:
         self.has_checked = True
-        if isinstance(expected, dict) and "matches" in expected:
-            if not isinstance(got, str) or not re.fullmatch(self.filled(expected["matches"]), got):
+        if isinstance(expected, dict) and "like" in expected:
+            pattern = re.escape(self.filled(expected["like"])).replace(r"\*", ".*")
+            if not isinstance(got, str) or not re.fullmatch(pattern, got, re.DOTALL):
                 raise Failure(f"expected {shown(expected)}, got {shown(got)}")
             return
         is_text = isinstance(expected, str) or (isinstance(expected, dict) and {"lines", "file"} & expected.keys())
