@@ -60,14 +60,14 @@ TEST_CASE("Ref: a record lives as long as somebody holds it")
 
 TEST_CASE("Ref: copying holds once more, moving does not")
 {
-    auto first = New<Leaf>();
-    auto second = first;
-    CHECK(first == second);
-    const auto third = std::move(first);
-    CHECK_FALSE(static_cast<bool>(first)); // NOLINT(bugprone-use-after-move): moved-from is null by promise
-    second = nullptr;
+    std::vector<Ref<Leaf>> holders(3, New<Leaf>());
+    CHECK(holders[0] == holders[2]);
+    Ref<Leaf> moved = std::move(holders[0]);
+    CHECK_FALSE(static_cast<bool>(holders[0]));
+    holders.clear();
     CHECK(living == 1);
-    CHECK(static_cast<bool>(third));
+    moved = nullptr;
+    CHECK(living == 0);
 }
 
 TEST_CASE("Ref: assigning itself changes nothing")
