@@ -2,12 +2,14 @@
 // is there twice.
 #pragma once
 
+#include <deque>
 #include <string>
 #include <unordered_map>
 
 #include "varnex3/xml/Lexer.h"
 #include "varnex3/xml/NamespaceScope.h"
 #include "varnex3/xml/Tree.h"
+#include "varnex3/xml/Unicode.h"
 
 namespace varnex3::xml {
 
@@ -44,12 +46,14 @@ private:
     static constexpr std::uint32_t noUri = 0;
     static constexpr std::uint32_t xmlUri = 1;
     static constexpr std::uint32_t xmlnsUri = 2;
+    static constexpr std::uint32_t firstOtherUri = 3;
     static constexpr std::uint32_t unknownUri = 0xFFFFFFFF;
     static constexpr std::size_t handful = 8;
 
     bool Declare(NodeIndex element, std::size_t attribute);
     bool IsAllowed(View prefix, std::uint32_t uri, const Char* at);
     std::uint32_t UriNumber(const TreeAttribute& attribute);
+    View UriOf(const TreeAttribute& attribute);
     std::uint32_t UriOfPrefix(View prefix) const;
     bool Expand(View name, ExpandedName& expanded);
     bool ExpandAll(std::size_t first, bool hasPrefixes);
@@ -60,9 +64,10 @@ private:
     Tree<Char>& tree;
     Lexer<Char>& lexer;
     NamespaceScope<Char> scope;
-    std::unordered_map<std::u16string, std::uint32_t> uriNumbers;
-    PlainArray<ExpandedName> names;   // of the attributes of one element
-    PlainArray<std::uint32_t> places; // a hash table of numbers in `names`
+    std::unordered_map<View, std::uint32_t> uriNumbers; // of the namespaces that are not reserved
+    std::deque<std::basic_string<Char>> decodedUris;    // those that do not stand in the text as they are
+    PlainArray<ExpandedName> names;                     // of the attributes of one element
+    PlainArray<std::uint32_t> places;                   // a hash table of numbers in `names`
 };
 
 template <class Char>
@@ -119,14 +124,28 @@ bool AttributeCheck<Char>::IsAllowed(View prefix, std::uint32_t uri, const Char*
 template <class Char>
 std::uint32_t AttributeCheck<Char>::UriNumber(const TreeAttribute& attribute)
 {
-    if (uriNumbers.empty())
-        uriNumbers = {{u"", noUri},
-                      {u"http://www.w3.org/XML/1998/namespace", xmlUri},
-                      {u"http://www.w3.org/2000/xmlns/", xmlnsUri}};
+    const View uri = UriOf(attribute);
+    if (uri.empty())
+        return noUri;
+    if (EqualsAscii(uri, "http://www.w3.org/XML/1998/namespace"))
+        return xmlUri;
+    if (EqualsAscii(uri, "http://www.w3.org/2000/xmlns/"))
+        return xmlnsUri;
+    const auto next = firstOtherUri + static_cast<std::uint32_t>(uriNumbers.size());
+    return uriNumbers.try_emplace(uri, next).first->second;
+}
+
+template <class Char>
+std::basic_string_view<Char> AttributeCheck<Char>::UriOf(const TreeAttribute& attribute)
+{
+    if (!attribute.needsDecoding)
+        return tree.RawValue(attribute);
     std::u16string uri;
     tree.AppendValue(uri, attribute);
-    const auto next = static_cast<std::uint32_t>(uriNumbers.size());
-    return uriNumbers.try_emplace(std::move(uri), next).first->second;
+    if constexpr (sizeof(Char) == 1)
+        return decodedUris.emplace_back(ToUtf8(uri));
+    else
+        return decodedUris.emplace_back(std::move(uri));
 }
 
 template <class Char>

@@ -147,7 +147,8 @@ public:
     // writes it, each ended with CR LF; no DOCTYPE. Loading the text gives the same document. u"" for an empty one.
     std::u16string Xml() const;
 
-    // Saves as UTF-8, atomically; a declaration says so. Throws std::system_error. Precondition: not empty.
+    // Saves as UTF-8, atomically; the declaration, when there is one, says so. Throws std::system_error.
+    // Precondition: not empty.
     void SaveFile(std::u16string_view path) const;
 
 private:

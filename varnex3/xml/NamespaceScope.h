@@ -2,6 +2,7 @@
 // however many there are.
 #pragma once
 
+#include <algorithm>
 #include <cstdint>
 #include <string_view>
 
@@ -49,35 +50,49 @@ public:
 
     void Declare(View prefix, NodeIndex element, std::uint32_t attribute, std::uint32_t uri)
     {
-        if (bindings.Size() >= buckets.Size())
-            Rehash();
         bindings.Append({prefix, element, attribute, uri, none});
-        Link(bindings.Size() - 1);
+        if (bindings.Size() > std::max(handful, buckets.Size()))
+            Rehash();
+        else if (IsHashed())
+            Link(bindings.Size() - 1);
     }
 
     // Forgets what the element, the innermost with declarations, declares.
     void Leave(NodeIndex element)
     {
         while (!bindings.IsEmpty() && bindings.Back().element == element) {
-            Bucket(bindings.Back().prefix) = bindings.Back().shadowed;
+            if (IsHashed())
+                Bucket(bindings.Back().prefix) = bindings.Back().shadowed;
             bindings.Resize(bindings.Size() - 1);
         }
     }
 
     // The number of the innermost binding of a prefix, or `none`.
-    std::uint32_t Find(View prefix) const
+    std::uint32_t Find(View prefix) const { return IsHashed() ? FindByHash(prefix) : FindAmongFew(prefix); }
+
+    static constexpr std::uint32_t none = 0xFFFFFFFF;
+
+private:
+    static constexpr std::size_t handful = 8; // as many are searched one by one
+
+    bool IsHashed() const { return !buckets.IsEmpty(); }
+
+    std::uint32_t FindAmongFew(View prefix) const
     {
-        if (bindings.IsEmpty())
-            return none;
+        for (std::size_t at = bindings.Size(); at-- > 0;)
+            if (bindings[at].prefix == prefix)
+                return static_cast<std::uint32_t>(at);
+        return none;
+    }
+
+    std::uint32_t FindByHash(View prefix) const
+    {
         std::uint32_t at = buckets[BucketNumber(prefix)];
         while (at != none && bindings[at].prefix != prefix)
             at = bindings[at].shadowed;
         return at;
     }
 
-    static constexpr std::uint32_t none = 0xFFFFFFFF;
-
-private:
     std::size_t BucketNumber(View prefix) const { return HashOf(prefix, HashSeed()) & (buckets.Size() - 1); }
     std::uint32_t& Bucket(View prefix) { return buckets[BucketNumber(prefix)]; }
 
@@ -90,7 +105,7 @@ private:
 
     void Rehash()
     {
-        buckets.Fill(buckets.IsEmpty() ? 16 : buckets.Size() * 2, none);
+        buckets.Fill(IsHashed() ? buckets.Size() * 2 : 2 * handful, none);
         for (std::size_t i = 0; i < bindings.Size(); ++i)
             Link(i);
     }

@@ -65,10 +65,11 @@ public:
             new (items.get() + count) T(item);
     }
 
-    // Gives back what more than a quarter of slack holds.
+    // Gives slack back where it is much.
     void Shrink()
     {
-        if (capacity > count + count / 4)
+        constexpr std::size_t littleSlack = 512; // bytes
+        if ((capacity - count) * sizeof(T) > littleSlack && capacity > count + count / 4)
             Reallocate(count);
     }
 
