@@ -1,4 +1,5 @@
-// What a document costs in memory, a line a job and size: job, items, bytes of the UTF-16 text, peak, allocations.
+// What reading a document and writing a record cost in memory, a line a job and size: job, items, bytes of the UTF-16
+// text, peak, allocations.
 //
 //     varnex3_bench_memory FOLDER
 //
@@ -7,6 +8,7 @@
 #include <string>
 
 #include "CountingHeap.h"
+#include "varnex3/core/InsurerOptDef.h"
 #include "varnex3/xml/Document.h"
 #include "varnex3/xml/Files.h"
 #include "varnex3/xml/Unicode.h"
@@ -15,8 +17,13 @@ using namespace varnex3;
 
 namespace {
 
+void Print(const char* job, int items, std::size_t textBytes, const benchmarks::HeapUse& use)
+{
+    std::cout << job << '\t' << items << '\t' << textBytes << '\t' << use.peak << '\t' << use.allocations << '\n';
+}
+
 template <typename Load>
-bool Measure(const char* job, int items, std::size_t textBytes, Load load)
+bool MeasureLoading(const char* job, int items, std::size_t textBytes, Load load)
 {
     benchmarks::StartCounting();
     bool isLoaded = false;
@@ -24,9 +31,19 @@ bool Measure(const char* job, int items, std::size_t textBytes, Load load)
         xml::Document document;
         isLoaded = load(document);
     }
-    const benchmarks::HeapUse use = benchmarks::Counted();
-    std::cout << job << '\t' << items << '\t' << textBytes << '\t' << use.peak << '\t' << use.allocations << '\n';
+    Print(job, items, textBytes, benchmarks::Counted());
     return isLoaded;
+}
+
+// A record that writes a line an item, and nothing whose form needs a text of its own.
+void MeasureWriting(int items)
+{
+    const auto insurer = New<InsurerOptDef>();
+    for (int i = 0; i < items; ++i)
+        insurer->InsurerDetail()->Add(u"Field " + xml::ToUtf16(std::to_string(i)), u"a value of the usual length");
+    benchmarks::StartCounting();
+    const Text text = insurer->Serialise();
+    Print("serialise", items, text.size() * sizeof(char16_t), benchmarks::Counted());
 }
 
 bool MeasureQuote(const std::string& folder, int items)
@@ -35,8 +52,9 @@ bool MeasureQuote(const std::string& folder, int items)
     const std::string bytes = xml::ReadFile(xml::ToUtf16(path));
     const std::u16string text = xml::ToUtf16(bytes);
     const std::size_t textBytes = text.size() * sizeof(char16_t);
-    return Measure("utf8", items, textBytes, [&](xml::Document& document) { return document.LoadBytes(bytes); })
-           && Measure("utf16", items, textBytes, [&](xml::Document& document) { return document.LoadText(text); });
+    return MeasureLoading("utf8", items, textBytes, [&](xml::Document& document) { return document.LoadBytes(bytes); })
+           && MeasureLoading("utf16", items, textBytes,
+                             [&](xml::Document& document) { return document.LoadText(text); });
 }
 
 // A heap that is not counted would show as figures of zero, which look good.
@@ -56,10 +74,12 @@ int main(int argc, char** argv)
         std::cerr << (argc != 2 ? "usage: varnex3_bench_memory FOLDER\n" : "the heap is not counted\n");
         return 2;
     }
-    for (const int items : {5, 50, 500, 5000})
+    for (const int items : {5, 50, 500, 5000}) {
         if (!MeasureQuote(argv[1], items)) {
             std::cerr << "quote-" << items << ".xml was refused\n";
             return 2;
         }
+        MeasureWriting(items);
+    }
     return 0;
 }
