@@ -193,15 +193,18 @@ class Connection:
             statement.check(odbc.SQLExecDirectW(statement.handle, wide(sql), -3))
             return statement.row_sets()
 
-    def call(self, procedure: str, parameters: Sequence[Parameter], timeout: int = 0) -> Outcome:
+    def call(
+        self, procedure: str, parameters: Sequence[Parameter], timeout: int = 0, has_status: bool = True
+    ) -> Outcome:
+        """Waits at most so many seconds, when that is not 0. MariaDB's procedures have no status."""
         with Statement(self.handle) as statement:
             if timeout:
                 odbc.SQLSetStmtAttrW(statement.handle, ATTR_QUERY_TIMEOUT, ctypes.c_void_p(timeout), 0)
             status = Parameter("0", True, True)
-            for place, parameter in enumerate([status, *parameters], start=1):
+            for place, parameter in enumerate([status, *parameters] if has_status else parameters, start=1):
                 statement.bind(place, parameter)
             marks = ",".join("?" * len(parameters))
-            sql = f"{{?=CALL {procedure}({marks})}}" if parameters else f"{{?=CALL {procedure}}}"
+            sql = f"{{{'?=' if has_status else ''}CALL {procedure}({marks})}}"
             statement.check(odbc.SQLExecDirectW(statement.handle, wide(sql), -3))
             row_sets = statement.row_sets()
             outputs = [parameter.value() for parameter in parameters if parameter.is_output]
