@@ -15,6 +15,9 @@ write_basic_package_version_file(${PROJECT_BINARY_DIR}/varnex3ConfigVersion.cmak
 install(FILES ${PROJECT_BINARY_DIR}/varnex3Config.cmake ${PROJECT_BINARY_DIR}/varnex3ConfigVersion.cmake
     DESTINATION ${CMAKE_INSTALL_LIBDIR}/cmake/varnex3)
 
+# The prefix is found from where the file stands, so that an installed tree can be moved.
+file(RELATIVE_PATH up /${CMAKE_INSTALL_LIBDIR}/pkgconfig /)
+set(PKGCONFIG_PREFIX "\${pcfiledir}/${up}")
 foreach(package varnex3 varnex3_c)
     configure_file(cmake/${package}.pc.in ${PROJECT_BINARY_DIR}/${package}.pc @ONLY)
     install(FILES ${PROJECT_BINARY_DIR}/${package}.pc DESTINATION ${CMAKE_INSTALL_LIBDIR}/pkgconfig)
