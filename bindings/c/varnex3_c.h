@@ -35,7 +35,8 @@ extern "C" {
 typedef struct varnex3_record varnex3_record;
 
 /* What a value is, and what a member takes and gives. */
-typedef enum varnex3_kind {
+typedef enum varnex3_kind
+{
     VARNEX3_EMPTY = 0,   /* nothing: converts to "", 0, the zero date and false; of a member: it gives nothing */
     VARNEX3_TEXT = 1,    /* text, length */
     VARNEX3_DOUBLE = 2,  /* number */
@@ -49,17 +50,19 @@ typedef enum varnex3_kind {
 } varnex3_kind;
 
 /* A value. What the library gives is the caller's to clear; what it is given stays the caller's and is copied. */
-typedef struct varnex3_value {
-    int32_t kind;    /* a varnex3_kind */
-    int32_t integer; /* integers and Booleans */
-    double number;   /* doubles and dates */
+typedef struct varnex3_value
+{
+    int32_t kind;     /* a varnex3_kind */
+    int32_t integer;  /* integers and Booleans */
+    double number;    /* doubles and dates */
     const char* text; /* UTF-8; what the library gives ends with a NUL */
-    size_t length;   /* of the text, in bytes, without that NUL */
+    size_t length;    /* of the text, in bytes, without that NUL */
     varnex3_record* record;
 } varnex3_value;
 
 /* A class, or a module: functions that need no record. */
-typedef struct varnex3_class {
+typedef struct varnex3_class
+{
     const char* name;
     const char* doc;
     int32_t is_module;
@@ -67,7 +70,8 @@ typedef struct varnex3_class {
 } varnex3_class;
 
 /* A method or property of a class, in interface order. */
-typedef struct varnex3_member {
+typedef struct varnex3_member
+{
     const char* name;
     const char* doc;
     int32_t is_property;     /* 0: a method */
@@ -77,7 +81,8 @@ typedef struct varnex3_member {
     int32_t parameter_count; /* of a property: how many indexes it takes */
 } varnex3_member;
 
-typedef struct varnex3_parameter {
+typedef struct varnex3_parameter
+{
     const char* name;
     int32_t kind;
     const char* type_name;
@@ -87,13 +92,15 @@ typedef struct varnex3_parameter {
     int32_t is_output;       /* the argument holds a result after the call */
 } varnex3_parameter;
 
-typedef struct varnex3_enumeration {
+typedef struct varnex3_enumeration
+{
     const char* name;
     const char* doc;
     int32_t constant_count;
 } varnex3_enumeration;
 
-typedef struct varnex3_constant {
+typedef struct varnex3_constant
+{
     const char* name;
     const char* doc;
     int32_t value;

@@ -36,7 +36,7 @@ static varnex3_value whole(int32_t number)
 static int holds_text(varnex3_value* value, const char* expected)
 {
     const int is_same = value->kind == VARNEX3_TEXT && value->length == strlen(expected)
-                     && memcmp(value->text, expected, value->length) == 0;
+                        && memcmp(value->text, expected, value->length) == 0;
     varnex3_value_clear(value);
     return is_same;
 }
@@ -94,14 +94,16 @@ static void children_travel_by_reference(void)
     varnex3_create("VehicleDef", &vehicle);
     varnex3_put(name, "Surname", &value);
     check(varnex3_put_reference(customer, "PersonalName", name) == 0, "a child is stored by reference");
-    check(varnex3_get(customer, "PersonalName", &child) == 0 && child.record == name, "and is the same record when read");
+    check(varnex3_get(customer, "PersonalName", &child) == 0 && child.record == name,
+          "and is the same record when read");
     varnex3_value_clear(&child);
     check(varnex3_put_reference(customer, "PersonalName", vehicle) == 13, "a record of another class is refused");
     check(varnex3_put_reference(customer, "PersonalName", NULL) == 0, "null sets a child to nothing");
     check(varnex3_get(customer, "PersonalName", &child) == 0 && child.record != NULL && child.record != name,
           "which is made again at the next access");
     varnex3_value_clear(&child);
-    check(varnex3_to_json(vehicle, &value) == 0 && strstr(value.text, "\"VIN\":\"\"") != NULL, "a record is shown as JSON");
+    check(varnex3_to_json(vehicle, &value) == 0 && strstr(value.text, "\"VIN\":\"\"") != NULL,
+          "a record is shown as JSON");
     varnex3_value_clear(&value);
     varnex3_release(vehicle);
     varnex3_release(name);
@@ -130,7 +132,8 @@ static void indexed_properties_and_results_by_reference(void)
 
     varnex3_create("Xalo_Messages", &messages);
     scan[0] = text("/no such folder");
-    check(varnex3_call(messages, "ParseFiles", scan, 3, &result) == 0 && result.kind == VARNEX3_BOOLEAN && !result.integer,
+    check(varnex3_call(messages, "ParseFiles", scan, 3, &result) == 0 && result.kind == VARNEX3_BOOLEAN
+              && !result.integer,
           "a scan of a missing folder gives false");
     check(scan[1].integer == 30030 && strcmp(scan[2].text, "Folder '/no such folder' does not exist.") == 0,
           "and says why in its arguments");
@@ -173,7 +176,8 @@ static void the_library_describes_itself(void)
     for (i = 0; varnex3_enumeration_at(i, &enumeration) == 0; ++i)
         check(varnex3_constant_at(i, 0, &constant) == 0 && constant.name[0] != '\0', "every enumeration has constants");
     check(i == varnex3_enumeration_count() && i > 0, "every enumeration is described");
-    check(varnex3_constant_value("CustomerTypeEnum", "Company", &value) == 0 && value == 1, "a constant is found by name");
+    check(varnex3_constant_value("CustomerTypeEnum", "Company", &value) == 0 && value == 1,
+          "a constant is found by name");
     check(varnex3_constant_value("CustomerTypeEnum", "Wheels", &value) == 5, "an unknown constant is an error");
 }
 
