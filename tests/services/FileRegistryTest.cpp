@@ -2,8 +2,11 @@
 #include "varnex3/services/FileRegistry.h"
 
 #include <array>
+#include <atomic>
 #include <chrono>
+#include <csignal>
 #include <functional>
+#include <new>
 #include <thread>
 #include <vector>
 

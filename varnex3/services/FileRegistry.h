@@ -21,7 +21,7 @@ namespace varnex3 {
 // file that was changed by other means is read again.
 //
 // A key is opened for reading and writing without the right to write: writing then ends in AccessDenied. A key that is
-// open several times is one handle, so that handles nobody closes cost no memory.
+// open several times is one handle, so that handles nobody closes take no more memory each time.
 class FileRegistry final : public Registry
 {
 public:

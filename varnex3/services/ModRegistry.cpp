@@ -14,7 +14,8 @@ namespace varnex3 {
 
 namespace {
 
-using Buffer = std::array<char, 1024>;
+constexpr std::size_t kBufferSize = 1024;
+using Buffer = std::array<char, kBufferSize>;
 
 // Data without the zero byte that ends a text.
 std::string_view WithoutTerminator(std::string_view data)
@@ -99,8 +100,10 @@ std::optional<double> WholeNumber(TextView text)
 std::string NumberBytes(double number)
 {
     std::string bytes;
-    for (int i = 0; i < 4; ++i, number = std::trunc(number / 256))
+    while (bytes.size() < 4) {
         bytes += static_cast<char>(static_cast<int>(std::fmod(number, 256)));
+        number = std::trunc(number / 256);
+    }
     return bytes;
 }
 
@@ -118,7 +121,7 @@ std::optional<std::string> DataFor(RegistryType type, TextView sValue, const Buf
 // The data of a text of any length; nothing when there is no such text.
 std::optional<std::string> QueryText(RegistryKey key, const std::string& name, Registry& registry)
 {
-    std::string data(std::tuple_size_v<Buffer>, '\0');
+    std::string data(kBufferSize, '\0');
     QueriedValue value = registry.Query(key, name, data);
     while (value.status == RegistryStatus::MoreData && value.length > data.size()) {
         data.resize(value.length);
@@ -185,7 +188,7 @@ Text QueryRegValue(RegistryRoot hRoot, TextView sKeyPath, TextView sValueName, R
     }
     if (value.length == 0)
         return {}; // and the key stays open
-    const Text text = ValueText(value.type, WithoutTerminator({buffer.data(), value.length}));
+    Text text = ValueText(value.type, WithoutTerminator({buffer.data(), value.length}));
     registry.Close(key);
     return text;
 }

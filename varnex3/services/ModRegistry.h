@@ -20,8 +20,9 @@ Text GetAppSetting(TextView sApp, TextView sSection, TextView sKey, const Text& 
 // Software\VB and VBA Program Settings\sApp\sSection, where SaveSetting and GetSetting of the classic hosts keep them.
 Text PerUserKey(TextView sApp, TextView sSection);
 
-// A value as text: a text of up to 1024 bytes, or a 32-bit number in decimal. The number is read from the hexadecimal
-// digits of its bytes, each without leading zeros: 258, whose bytes are 2, 1, 0, 0, is u"18". Anything else is u"".
+// A value as text: a text of up to 1024 bytes, with the zero byte that ends it, or a 32-bit number in decimal. The
+// number is read from the hexadecimal digits of its bytes, each without leading zeros: 258, whose bytes are 2, 1, 0, 0,
+// is u"18". Anything else is u"".
 Text QueryRegValue(RegistryRoot hRoot, TextView sKeyPath, TextView sValueName, Registry& registry = SystemRegistry());
 
 // Writes a value of a key that is there. A new value becomes a text; one that is there keeps its type: a 32-bit number

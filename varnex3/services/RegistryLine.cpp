@@ -104,7 +104,13 @@ std::string ToWideBytes(std::string_view data)
     return bytes;
 }
 
-// Reads a line from left to right. What is wrong with it is thrown as the reason, and caught where reading began.
+// What is wrong with a line.
+struct Fault
+{
+    Name reason;
+};
+
+// Reads a line from left to right, up to the first fault, which it throws.
 class LineReader
 {
 public:
@@ -113,7 +119,7 @@ public:
     RegistryLine Read()
     {
         if (!IsUtf8(text))
-            throw kNotUtf8;
+            throw Fault{kNotUtf8};
         SkipBlanks();
         if (IsAtRemark() || TakeHead())
             return line;
@@ -122,7 +128,7 @@ public:
         else if (Next() == '"' || Next() == '@')
             ReadValue();
         else
-            throw kUnknown;
+            throw Fault{kUnknown};
         return line;
     }
 
@@ -156,11 +162,11 @@ private:
         line.kind = Take("-") ? RegistryLine::Kind::KeyDeletion : RegistryLine::Kind::Key;
         const std::size_t end = text.rfind(']');
         if (end == std::string_view::npos || end < at)
-            throw kNoBracket;
+            throw Fault{kNoBracket};
         line.key = text.substr(at, end - at);
         line.key.erase(line.key.find_last_not_of('\\') + 1);
         if (line.key.empty() || line.key.front() == '\\' || line.key.find("\\\\") != std::string::npos)
-            throw kEmptyPart;
+            throw Fault{kEmptyPart};
         at = end + 1;
         ReadRemark();
     }
@@ -172,7 +178,7 @@ private:
             line.name = ReadText();
         SkipBlanks();
         if (!Take("="))
-            throw kNoEqualsSign;
+            throw Fault{kNoEqualsSign};
         SkipBlanks();
         line.dataAt = at;
         ReadData();
@@ -190,7 +196,7 @@ private:
         else if (Take("hex"))
             ReadBytes();
         else
-            throw kUnknownData;
+            throw Fault{kUnknownData};
     }
 
     // A text in quotation marks.
@@ -199,11 +205,11 @@ private:
         std::string plain;
         for (++at; at < text.size() && text[at] != '"'; ++at) {
             if (text[at] == '\\' && ++at < text.size() && text[at] != '\\' && text[at] != '"')
-                throw kSingleBackslash;
+                throw Fault{kSingleBackslash};
             plain += at < text.size() ? text.substr(at, 1) : "";
         }
         if (at >= text.size())
-            throw kNoQuote;
+            throw Fault{kNoQuote};
         ++at;
         return plain;
     }
@@ -222,7 +228,7 @@ private:
     {
         const std::string_view digits = TakeWord();
         if (!IsHexadecimal(digits, 8))
-            throw kNotNumber32;
+            throw Fault{kNotNumber32};
         return Number32Data(HexNumber(digits));
     }
 
@@ -230,7 +236,7 @@ private:
     {
         line.value.type = Take("(") ? ReadType() : RegistryType::Binary;
         if (!Take(":"))
-            throw kUnknownData;
+            throw Fault{kUnknownData};
         const std::string bytes = BytesFrom(TakeWord());
         line.value.data = HasWideBytes(line.value.type, dialect) ? FromWideBytes(bytes) : bytes;
     }
@@ -239,10 +245,10 @@ private:
     {
         const std::string_view digits = Rest().substr(0, Rest().find(')'));
         if (!IsHexadecimal(digits, 8))
-            throw kNotType;
+            throw Fault{kNotType};
         at += digits.size();
         if (!Take(")"))
-            throw kNotType;
+            throw Fault{kNotType};
         return static_cast<RegistryType>(HexNumber(digits));
     }
 
@@ -253,9 +259,9 @@ private:
             const std::size_t comma = std::min(list.find(','), list.size());
             const std::string_view digits = Unblanked(list.substr(0, comma));
             if (digits == "\\")
-                throw kNotContinued;
+                throw Fault{kNotContinued};
             if (!IsHexadecimal(digits, 2) || comma + 1 == list.size())
-                throw kNotBytes;
+                throw Fault{kNotBytes};
             bytes += static_cast<char>(HexNumber(digits));
             list.remove_prefix(std::min(comma + 1, list.size()));
         }
@@ -267,7 +273,7 @@ private:
         line.remark = Rest();
         SkipBlanks();
         if (!IsAtRemark())
-            throw kRest;
+            throw Fault{kRest};
     }
 
     std::string_view text;
@@ -308,10 +314,10 @@ RegistryLine ReadRegistryLine(std::string_view text, RegistryDialect dialect)
 {
     try {
         return LineReader(text, dialect).Read();
-    } catch (Name reason) {
+    } catch (const Fault& fault) {
         RegistryLine damaged;
         damaged.kind = RegistryLine::Kind::Damaged;
-        damaged.reason = reason;
+        damaged.reason = fault.reason;
         return damaged;
     }
 }

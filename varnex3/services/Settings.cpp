@@ -31,7 +31,7 @@ std::string UserFolder()
 
 std::string FolderOf(RegistryRoot root)
 {
-    if (const std::string folder = Variable("VARNEX3_SETTINGS_DIR"); !folder.empty())
+    if (std::string folder = Variable("VARNEX3_SETTINGS_DIR"); !folder.empty())
         return folder;
     return root == RegistryRoot::LocalMachine ? "/etc/varnex3" : UserFolder();
 }
