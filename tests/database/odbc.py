@@ -108,7 +108,7 @@ class Statement:
     def bind(self, place: int, parameter: Parameter) -> None:
         direction = PARAM_INPUT_OUTPUT if parameter.is_output else PARAM_INPUT
         c_type, sql_type = (C_LONG, INTEGER) if parameter.is_integer else (C_WCHAR, WVARCHAR)
-        size = ctypes.c_size_t(10 if parameter.is_integer else 255)
+        size = ctypes.c_size_t(10 if parameter.is_integer else max(255, parameter.length.value // 2))
         self.check(
             odbc.SQLBindParameter(
                 self.handle,
@@ -196,7 +196,11 @@ class Connection:
     def call(
         self, procedure: str, parameters: Sequence[Parameter], timeout: int = 0, has_status: bool = True
     ) -> Outcome:
-        """Waits at most so many seconds, when that is not 0. MariaDB's procedures have no status."""
+        """Waits at most so many seconds, when that is not 0.
+
+        MariaDB's procedures have no status; its driver gives the outputs as a last row set and fills what is bound to
+        them with bytes of another form, so they are not read.
+        """
         with Statement(self.handle) as statement:
             if timeout:
                 odbc.SQLSetStmtAttrW(statement.handle, ATTR_QUERY_TIMEOUT, ctypes.c_void_p(timeout), 0)
@@ -207,7 +211,7 @@ class Connection:
             sql = f"{{{'?=' if has_status else ''}CALL {procedure}({marks})}}"
             statement.check(odbc.SQLExecDirectW(statement.handle, wide(sql), -3))
             row_sets = statement.row_sets()
-            outputs = [parameter.value() for parameter in parameters if parameter.is_output]
+            outputs = [parameter.value() for parameter in parameters if parameter.is_output and has_status]
             return Outcome(row_sets, int(status.value() or 0), outputs)
 
     def parameter_list(self, procedure: str) -> List[List[Optional[str]]]:

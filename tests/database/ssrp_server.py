@@ -54,9 +54,9 @@ def main() -> None:
             request, client = listener.recvfrom(1024)
             instance = instance_asked_for(request)
             is_known = instance is not None and instance.lower() in ("", options.instance.lower())
+            print(json.dumps({"instance": instance, "answered": is_known}), file=log, flush=True)
             if is_known:
                 listener.sendto(answer_about(options.instance, options.tcp_port), client)
-            print(json.dumps({"instance": instance, "answered": is_known}), file=log, flush=True)
 
 
 if __name__ == "__main__":

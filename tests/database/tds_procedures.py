@@ -39,6 +39,7 @@ REFERENCE_SETS = {
     "REPAIRMODELTYPE": (ASSESSED, ("CP", "Allocated"), TENDERING),
     "ERRORSEVERITY": (("E", "Error"), ("F", "Fatal"), ("I", "Information"), ("W", "Warning")),
 }
+TAKEN = (("Code", "varchar(20)"), ("Description", "nvarchar(max)"))
 ONE_ROW = Rows(CODES, [ASSESSED])
 NO_ROWS = Rows(CODES, [])
 
@@ -62,7 +63,7 @@ def what_was_taken(values: Values) -> Sequence[Step]:
     """One row an input parameter: its name, and its value as text, as it is after the conversion to the declared type."""
     outputs = {parameter.name for parameter in OUTPUTS}
     taken = [(name, None if value is None else text_of(value)) for name, value in values.items() if name not in outputs]
-    return [Rows(CODES, taken), succeed()]
+    return [Rows(TAKEN, taken), succeed()]
 
 
 def wait(values: Values) -> Sequence[Step]:
