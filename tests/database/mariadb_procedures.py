@@ -10,7 +10,6 @@ from __future__ import annotations
 import re
 import uuid
 from datetime import date, datetime, time
-from decimal import Decimal
 from typing import Dict, List, Optional
 
 from tds_procedures import NO_ROWS, PROCEDURES, TYPED_COLUMNS, many_rows, reference_set, wait, what_was_taken
@@ -51,7 +50,9 @@ def literal(value: Value) -> str:
         return f"x'{value.hex()}'"
     if isinstance(value, (str, date, datetime, time, uuid.UUID)):
         return "'" + str(value).translate(ESCAPES) + "'"
-    return str(int(value)) if isinstance(value, bool) else str(Decimal(repr(value)) if isinstance(value, float) else value)
+    if isinstance(value, bool):
+        return str(int(value))
+    return repr(value) if isinstance(value, float) else str(value)
 
 
 def type_of(type_: SqlType) -> str:

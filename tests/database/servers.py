@@ -14,7 +14,7 @@ from typing import Any, Callable, Dict, List, Optional, Type
 
 HERE = pathlib.Path(__file__).resolve().parent
 PASSWORD = "x"
-DRIVERS = "[SQL Server]\nDriver=libtdsodbc.so\n[SQL Native Client]\nDriver=libtdsodbc.so\n[MariaDB]\nDriver=libmaodbc.so\n"
+DRIVERS = {"SQL Server": "libtdsodbc.so", "SQL Native Client": "libtdsodbc.so", "MariaDB": "libmaodbc.so"}
 
 
 def wait_for(what: str, is_there: Callable[[], bool], seconds: float = 10) -> None:
@@ -35,7 +35,8 @@ class Server:
         self.folder = tempfile.TemporaryDirectory(prefix="varnex3-database-")
         self.ready = pathlib.Path(self.folder.name, "ready")
         self.log_file = pathlib.Path(self.folder.name, "log")
-        command = [sys.executable, str(HERE / self.program), "--port-file", str(self.ready), *self.common(), *map(str, words)]
+        command = [sys.executable, str(HERE / self.program), "--port-file", str(self.ready)]
+        command += [*self.common(), *map(str, words)]
         self.process = subprocess.Popen(command, stdin=subprocess.DEVNULL, stdout=subprocess.DEVNULL)
         try:
             wait_for(f"the answer of {self.program}", self.is_ready, self.longest_start)
@@ -102,5 +103,6 @@ class MariaDB(Server):
 
 def register_drivers(folder: pathlib.Path) -> None:
     """Makes the names of the drivers known to this process and those that it starts, and to nobody else."""
-    (folder / "odbcinst.ini").write_text(DRIVERS, encoding="utf-8")
+    text = "".join(f"[{name}]\nDriver={library}\n" for name, library in DRIVERS.items())
+    (folder / "odbcinst.ini").write_text(text, encoding="utf-8")
     os.environ["ODBCSYSINI"] = str(folder)

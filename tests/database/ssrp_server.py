@@ -41,7 +41,7 @@ def main() -> None:
     parser.add_argument("--port", type=int, default=1434, help="where this program listens; 0 takes any free port")
     parser.add_argument("--port-file", type=pathlib.Path, help="where that port is written")
     parser.add_argument("--log", type=pathlib.Path, default=pathlib.Path("/dev/null"), help="where requests are logged")
-    parser.add_argument("--end-with-parent", action="store_true", help="end when the program that started this one ends")
+    parser.add_argument("--end-with-parent", action="store_true", help="end when the starting program does")
     options = parser.parse_args()
 
     end_on_sigterm()

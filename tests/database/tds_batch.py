@@ -12,7 +12,8 @@ from tds_types import SqlType, declared
 from tds_values import Value
 
 WORD = re.compile(
-    r"(?P<text>N?'(?:[^']|'')*')|(?P<number>-?\d+(?:\.\d+)?)|(?P<name>[@#\w.$]+|\[[^]]*\](?:\.+\[?\w+\]?)*)|(?P<mark>[=,;*])"
+    r"(?P<text>N?'(?:[^']|'')*')|(?P<number>-?\d+(?:\.\d+)?)"
+    r"|(?P<name>[@#\w.$]+|\[[^]]*\](?:\.+\[?\w+\]?)*)|(?P<mark>[=,;])"
 )
 COMMENT = re.compile(r"--[^\n]*|/\*.*?\*/", re.DOTALL)
 IGNORED = {"set", "use"}

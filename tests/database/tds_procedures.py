@@ -39,6 +39,7 @@ REFERENCE_SETS = {
     "REPAIRMODELTYPE": (ASSESSED, ("CP", "Allocated"), TENDERING),
     "ERRORSEVERITY": (("E", "Error"), ("F", "Fatal"), ("I", "Information"), ("W", "Warning")),
 }
+OTHER_COLUMNS = (("Id", "int"), ("Label", "varchar(9)"))
 TAKEN = (("Code", "varchar(20)"), ("Description", "nvarchar(max)"))
 ONE_ROW = Rows(CODES, [ASSESSED])
 NO_ROWS = Rows(CODES, [])
@@ -53,14 +54,14 @@ def succeed() -> Set:
 
 
 def reference_set(values: Values) -> Sequence[Step]:
-    """The rows of a set, or the one whose code is the filter. The comparison ignores letter case, as the server's does."""
+    """The rows of a set, or the one whose code is the filter; letter case does not matter, as in the server."""
     name, code = text_of(values["@Name"]).upper(), text_of(values["@Filter"]).upper()
     rows = [row for row in REFERENCE_SETS.get(name, ()) if code in ("", row[0].upper())]
     return [Rows(CODES, rows), outcome(0)]
 
 
 def what_was_taken(values: Values) -> Sequence[Step]:
-    """One row an input parameter: its name, and its value as text, as it is after the conversion to the declared type."""
+    """One row an input parameter: its name, and its value as text, after the conversion to the declared type."""
     outputs = {parameter.name for parameter in OUTPUTS}
     taken = [(name, None if value is None else text_of(value)) for name, value in values.items() if name not in outputs]
     return [Rows(TAKEN, taken), succeed()]
@@ -237,7 +238,7 @@ PROCEDURES = (
     Procedure("rowSetTextID", (gives("@ID", "varchar(20)"), ERR_NO, ERR_MSG), always(ONE_ROW, outcome("42"))),
     Procedure("rowSetFails", OUTPUTS, always(ONE_ROW, outcome(42, -5, "The job is locked."))),
     Procedure("rowSetWithoutID", (ERR_NO, ERR_MSG), always(ONE_ROW, Set({"@ErrNo": 0}))),
-    Procedure("rowSetOtherColumns", OUTPUTS, always(Rows((("Id", "int"), ("Label", "varchar(9)")), [(1, "One")]), succeed())),
+    Procedure("rowSetOtherColumns", OUTPUTS, always(Rows(OTHER_COLUMNS, [(1, "One")]), succeed())),
     Procedure("rowSetOfTypes", OUTPUTS, always(Rows(TYPED_COLUMNS, [TYPED_ROW, [None] * len(TYPED_ROW)]), succeed())),
     Procedure("rowSetDifficult", OUTPUTS, always(Rows(CODES, DIFFICULT), succeed())),
     Procedure("manyRows", (takes("@Count", "int"), *OUTPUTS), many_rows),

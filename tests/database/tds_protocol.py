@@ -265,7 +265,8 @@ class Tokens:
         return b"\xac" + unsigned(position, 2) + short_text(name) + b"\x01" + described + type_.encode(value)
 
     def done(self, token: int, status: int, count: int = 0) -> bytes:
-        return bytes([token]) + unsigned(status, 2) + unsigned(0, 2) + unsigned(count, 8 if self.version >= TDS_7_2 else 4)
+        counted = unsigned(count, 8 if self.version >= TDS_7_2 else 4)
+        return bytes([token]) + unsigned(status, 2) + unsigned(0, 2) + counted
 
     def user_type(self) -> bytes:
         return bytes(4 if self.version >= TDS_7_2 else 2)

@@ -89,7 +89,7 @@ def arguments() -> argparse.Namespace:
     parser.add_argument("--password", default="x", help="of the user sa; x by default")
     parser.add_argument("--silent-login", action="store_true", help="accept connections and never answer")
     parser.add_argument("--refuse-after", type=int, metavar="N", help="refuse every connection after the Nth")
-    parser.add_argument("--end-with-parent", action="store_true", help="end when the program that started this one ends")
+    parser.add_argument("--end-with-parent", action="store_true", help="end when the starting program does")
     return parser.parse_args()
 
 

@@ -100,8 +100,8 @@ def value_for(procedure: Procedure, parameter: Parameter, argument: Optional[Arg
     """What the procedure sees: the argument in the parameter's declared type."""
     if argument is None or argument.is_default():
         if not parameter.has_default:
-            text = f"Procedure or function '{procedure.name}' expects parameter '{parameter.name}', which was not supplied."
-            raise Refused(201, text)
+            text = f"'{procedure.name}' expects parameter '{parameter.name}', which was not supplied."
+            raise Refused(201, f"Procedure or function {text}")
         return parameter.default
     return converted(parameter.type, argument.value)
 

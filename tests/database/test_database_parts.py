@@ -21,12 +21,12 @@ import odbc
 import ssrp_server
 from servers import HERE, PASSWORD, SsrpServer, TdsServer, register_drivers, wait_for
 from tds_procedures import DIFFICULT, PROCEDURES, REFERENCE_SETS, TYPED_COLUMNS
-from tds_steps import Procedure
 
 BINARY = pathlib.Path(os.environ["VARNEX3_BINARY_DIR"])
 BROWSER_PORT = 1434  # of UDP: drivers ask nowhere else
 NEEDED = {"tsql": "freetds-bin", "node": "npm", "npm": "npm"}
 REPAIR_MODELS: List[List[Optional[str]]] = [list(row) for row in REFERENCE_SETS["REPAIRMODELTYPE"]]
+TAKERS = ("takeIntegers", "takeFractions", "takeMoments", "takeBit", "takeTexts", "takeOthers")
 OUTPUTS = [["ID", "Int"], ["ErrNo", "Int"], ["ErrMsg", "VarChar"]]
 
 
@@ -37,10 +37,6 @@ def setUpModule() -> None:
     drivers = tempfile.TemporaryDirectory(prefix="varnex3-drivers-")
     unittest.addModuleCleanup(drivers.cleanup)
     register_drivers(pathlib.Path(drivers.name))
-
-
-def procedure_called(name: str) -> Procedure:
-    return next(procedure for procedure in PROCEDURES if procedure.name == name)
 
 
 class ServerTest(unittest.TestCase):
@@ -66,7 +62,8 @@ class Tsql(ServerTest):
     def test_every_version_of_the_protocol_gets_a_row_set(self) -> None:
         for version in ("7.1", "7.2", "7.3", "7.4"):
             with self.subTest(version):
-                output = self.run_tsql(version, "exec getVarnexReferenceSet 'REPAIRMODELTYPE', '', 0, 0, ''\ngo\nexit\n")
+                script = "exec getVarnexReferenceSet 'REPAIRMODELTYPE', '', 0, 0, ''\ngo\nexit\n"
+                output = self.run_tsql(version, script)
                 self.assertIn("Code\tDescription\nA\tAssessed\nCP\tAllocated\nT\tTendering\n(3 rows affected)", output)
                 self.assertEqual(self.server.logged("login")[-1]["tds"], version)
 
@@ -78,6 +75,11 @@ class Tsql(ServerTest):
         self.assertIn("Msg 18456", self.run_tsql("7.3", "exit\n", password="guess-me"))
         self.assertIs(self.server.logged("login")[-1]["password_right"], False)
         self.assertNotIn("guess-me", json.dumps(self.server.log()))
+
+    def test_an_input_left_out_takes_its_default_or_is_error_201(self) -> None:
+        output = self.run_tsql("7.3", "exec optionalInput 'given', default, 0, 0, ''\ngo\nexit\n")
+        self.assertIn("@Required\tgiven\n@Optional\tnone\n", output)
+        self.assertIn("Msg 201", self.run_tsql("7.3", "exec optionalInput default, 'x', 0, 0, ''\ngo\nexit\n"))
 
     def test_an_unknown_procedure_is_error_2812_and_bad_syntax_102(self) -> None:
         self.assertIn("Msg 2812", self.run_tsql("7.3", "exec noSuchProcedure 1\ngo\nexit\n"))
@@ -133,7 +135,8 @@ class SecondClient(ServerTest):
     def test_errors_and_two_row_sets_are_read(self) -> None:
         self.assertEqual(self.call("errorAfterRows")["error"], {"number": 50000, "message": "After the rows."})
         self.assertEqual(len(self.call("errorAfterRows")["sets"]), 1)
-        self.assertEqual([s["rows"] for s in self.call("twoRowSets")["sets"]], [[["A", "Assessed"]], [["T", "Tendering"]]])
+        row_sets = [row_set["rows"] for row_set in self.call("twoRowSets")["sets"]]
+        self.assertEqual(row_sets, [[["A", "Assessed"]], [["T", "Tendering"]]])
         self.assertEqual(self.call("noRowSetReturnsStatus")["status"], -6)
 
     def test_thousands_of_rows_are_read(self) -> None:
@@ -161,6 +164,9 @@ class Driver(ServerTest):
         with self.connect() as connection:
             return connection.call(name, odbc.given(*texts) + odbc.standard_outputs(), timeout)
 
+    def rows(self, name: str, *texts: Optional[str]) -> List[List[Optional[str]]]:
+        return self.call(name, *texts).row_sets[0].rows
+
     def outputs(self, name: str) -> List[Optional[str]]:
         outcome = self.call(name)
         self.assertEqual(outcome.row_sets, [])
@@ -175,8 +181,8 @@ class Driver(ServerTest):
                 self.assertEqual((outcome.status, outcome.outputs), (0, ["0", "0", None]))
 
     def test_a_filter_leaves_the_row_with_that_code(self) -> None:
-        self.assertEqual(self.call("getVarnexReferenceSet", "repairmodeltype", "cp").row_sets[0].rows, [["CP", "Allocated"]])
-        self.assertEqual(self.call("getVarnexReferenceSet", "NOSUCHSET", "").row_sets[0].rows, [])
+        self.assertEqual(self.rows("getVarnexReferenceSet", "repairmodeltype", "cp"), [["CP", "Allocated"]])
+        self.assertEqual(self.rows("getVarnexReferenceSet", "NOSUCHSET", ""), [])
 
     def test_a_server_part_that_ends_in_a_backslash_is_reached(self) -> None:
         where = {"TDSHOST": "127.0.0.1", "TDSPORT": str(self.server.port), "TDSVER": "7.3"}
@@ -200,8 +206,7 @@ class Driver(ServerTest):
 
     def test_the_parameter_list_tells_type_codes_and_sizes(self) -> None:
         with self.connect() as connection:
-            rows = [row for name in ("takeIntegers", "takeFractions", "takeMoments", "takeBit", "takeTexts", "takeOthers")
-                    for row in connection.parameter_list(name) if row[4] == "1"]
+            rows = [row for name in TAKERS for row in connection.parameter_list(name) if row[4] == "1"]
         facts = {str(row[3]): (row[5], row[7]) for row in rows}
         expected = {
             "@Tiny": ("-6", "3"), "@Small": ("5", "5"), "@Int": ("4", "10"), "@Big": ("-5", "19"),

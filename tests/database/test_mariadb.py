@@ -7,7 +7,7 @@ import pathlib
 import subprocess
 import tempfile
 import unittest
-from typing import Optional
+from typing import List, Optional
 
 import odbc
 from servers import HERE, MariaDB, register_drivers
@@ -35,22 +35,25 @@ class OnMariaDB(unittest.TestCase):
             parameters = odbc.given(*texts) + odbc.standard_outputs()
             return connection.call(name, parameters, has_status=False)
 
+    def rows(self, name: str, *texts: Optional[str]) -> List[List[Optional[str]]]:
+        return self.call(name, *texts).row_sets[0].rows
+
     def test_the_reference_sets_are_the_same(self) -> None:
         for name, rows in REFERENCE_SETS.items():
             found = self.call("getVarnexReferenceSet", name, "").row_sets
             self.assertEqual(found[0], odbc.RowSet(["Code", "Description"], [list(row) for row in rows]))
             self.assertEqual(found[1], odbc.RowSet(["@ID", "@ErrNo", "@ErrMsg"], [["0", "0", None]]))
-        self.assertEqual(self.call("getVarnexReferenceSet", "repairmodeltype", "cp").row_sets[0].rows, [["CP", "Allocated"]])
-        self.assertEqual(self.call("getVarnexReferenceSet", "NOSUCHSET", "").row_sets[0].rows, [])
+        self.assertEqual(self.rows("getVarnexReferenceSet", "repairmodeltype", "cp"), [["CP", "Allocated"]])
+        self.assertEqual(self.rows("getVarnexReferenceSet", "NOSUCHSET", ""), [])
 
     def test_outputs_without_a_row_set_are_a_row_set_of_their_own(self) -> None:
         expected = [odbc.RowSet(["@ID", "@ErrNo", "@ErrMsg"], [["42", "-5", "The job is locked by O'Brien."]])]
         self.assertEqual(self.call("noRowSetFails").row_sets, expected)
 
     def test_values_and_texts_are_the_same(self) -> None:
-        self.assertEqual(self.call("takeNumberAndText", "12", "AB").row_sets[0].rows, [["@Number", "12"], ["@Text", "AB"]])
-        self.assertEqual(self.call("rowSetDifficult").row_sets[0].rows, [list(row) for row in DIFFICULT])
-        self.assertEqual(len(self.call("manyRows", "5000").row_sets[0].rows), 5000)
+        self.assertEqual(self.rows("takeNumberAndText", "12", "AB"), [["@Number", "12"], ["@Text", "AB"]])
+        self.assertEqual(self.rows("rowSetDifficult"), [list(row) for row in DIFFICULT])
+        self.assertEqual(len(self.rows("manyRows", "5000")), 5000)
 
     def test_an_error_of_the_procedure_is_one_of_the_driver(self) -> None:
         with self.assertRaisesRegex(odbc.OdbcError, "No such set."):
@@ -61,7 +64,8 @@ class OnMariaDB(unittest.TestCase):
         command = ["mariadb", "--no-defaults", f"--socket={facts['socket']}", "--user=sa", "--password=x", "CrvSql"]
         sample = HERE.parent.parent / "samples/database/mariadb.sql"
         subprocess.run(command, input=sample.read_bytes(), check=True, timeout=30)
-        self.assertEqual(self.call("getVarnexReferenceSet", "REPAIRMODELTYPE", "").row_sets[0].rows, [list(row) for row in REFERENCE_SETS["REPAIRMODELTYPE"]])
+        expected = [list(row) for row in REFERENCE_SETS["REPAIRMODELTYPE"]]
+        self.assertEqual(self.rows("getVarnexReferenceSet", "REPAIRMODELTYPE", ""), expected)
 
     def test_it_ends_with_sigterm_and_leaves_nothing(self) -> None:
         server = MariaDB()
