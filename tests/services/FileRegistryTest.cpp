@@ -5,6 +5,7 @@
 #include <atomic>
 #include <chrono>
 #include <csignal>
+#include <fstream>
 #include <functional>
 #include <new>
 #include <thread>
@@ -232,12 +233,16 @@ TEST_CASE("A key that stays open because its value has no data is open until it 
     CHECK(SystemRegistry().Close(key) == RegistryStatus::InvalidHandle);
 }
 
-TEST_CASE("A file that is changed by other means is read again, however fast")
+TEST_CASE("A file that is changed by other means is read again, however fast, replaced or written over")
 {
     const SettingsFolder folder;
-    for (int i = 0; i < 200; ++i) {
+    for (int i = 0; i < 400; ++i) {
         const std::string digits = std::to_string(100 + i); // the size stays
-        folder.Write("machine.reg", kHead + "[HKEY_LOCAL_MACHINE\\k]\n\"v\"=\"" + digits + "\"\n");
+        const std::string bytes = kHead + "[HKEY_LOCAL_MACHINE\\k]\n\"v\"=\"" + digits + "\"\n";
+        if (i < 100)
+            folder.Write("machine.reg", bytes);
+        else
+            std::ofstream(folder.Path() + "/machine.reg") << bytes;
         CHECK(QueryRegValue(kMachine, u"k", u"v") == ToUtf16(digits));
     }
     std::filesystem::remove(folder.Path() + "/machine.reg");
