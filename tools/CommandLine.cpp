@@ -9,6 +9,7 @@
 #include "IdentifyCommand.h"
 #include "ScanCommand.h"
 #include "ScanReport.h"
+#include "SettingsCommand.h"
 #include "ShowCommand.h"
 #include "varnex3/core/Error.h"
 #include "varnex3/xml/Files.h"
@@ -19,7 +20,7 @@ namespace {
 
 constexpr const char* kJsonHelp = "Write JSON, one object a line";
 
-constexpr const char* kExitStatus = "Exit status: 0 fine, 1 something is wrong with a file, 2 could not run.";
+constexpr const char* kExitStatus = "Exit status: 0 fine, 1 something is wrong, 2 could not run.";
 
 constexpr const char* kScanExamples = R"(Examples:
   varnex3 scan inbox
@@ -35,6 +36,12 @@ constexpr const char* kShowExamples = R"(Examples:
   varnex3 show inbox/job-4711-2-quote.xml
   varnex3 show broken.xml
   varnex3 show --json quote.xml | jq .sections.Vehicle)";
+
+constexpr const char* kSettingsExamples = R"(Examples:
+  varnex3 settings list corvo32
+  varnex3 settings get corvo32 frmsplash ServerName
+  varnex3 settings set corvo32 frmsplash ServerName WORKSHOP1 --machine
+  varnex3 settings set corvo32 frmsplash SAPwd < password.txt)";
 
 std::vector<std::string> SortKeys()
 {
@@ -60,15 +67,14 @@ public:
     {
         app.require_subcommand(1);
         app.set_version_flag("--version", "varnex3 " VARNEX3_VERSION);
-        app.failure_message([](const CLI::App*, const CLI::Error& error) {
-            return "varnex3: " + Printable(xml::FromNativePath(error.what())) + "\nTry: varnex3 --help\n";
-        });
+        app.failure_message([this](const CLI::App*, const CLI::Error& error) { return FailureMessage(error); });
         app.footer(std::string("Try: varnex3 SUBCOMMAND --help\n\n") + kExitStatus);
         app.get_formatter()->column_width(20);
         app.get_formatter()->label("REQUIRED", "");
         AddScan();
         AddIdentify();
         AddShow();
+        AddSettings();
     }
 
     Status Run(int argumentCount, const char* const* arguments)
@@ -83,11 +89,29 @@ public:
     }
 
 private:
-    CLI::App* AddCommand(const char* name, const char* description, const char* examples)
+    // What the parser says names the argument it stumbled over, and among those of settings may be a password.
+    std::string FailureMessage(const CLI::Error& error) const
     {
-        CLI::App* const command = app.add_subcommand(name, description);
+        const bool mayNameArguments = !app.got_subcommand("settings");
+        const std::string reason = mayNameArguments ? Printable(xml::FromNativePath(error.what()))
+                                                    : "the arguments of settings are too few, too many or unknown";
+        return "varnex3: " + reason + "\nTry: varnex3 " + (mayNameArguments ? "" : "settings ") + "--help\n";
+    }
+
+    CLI::App* AddCommand(const char* name, const char* description, const char* examples, CLI::App* parent = nullptr)
+    {
+        CLI::App* const command = (parent ? parent : &app)->add_subcommand(name, description);
         command->footer(std::string(examples) + "\n\n" + kExitStatus);
         return command;
+    }
+
+    // What every command has: the option for JSON, and an action.
+    template <class Options, class Action>
+    void Finish(CLI::App* command, Options& options, Action action)
+    {
+        command->add_flag("--json", options.isJson, kJsonHelp);
+        command->callback(
+            [this, &options, action] { chosen = [this, &options, action] { return action(options, console); }; });
     }
 
     void AddScan()
@@ -100,8 +124,7 @@ private:
             ->add_option("--sort", scan.sort, "The order of the files; by name unless given:\n" + InWords(SortKeys()))
             ->check(CLI::IsMember(SortKeys()).description(""))
             ->type_name("KEY");
-        command->add_flag("--json", scan.isJson, kJsonHelp);
-        command->callback([this] { chosen = [this] { return Scan(scan, console); }; });
+        Finish(command, scan, Scan);
     }
 
     void AddIdentify()
@@ -109,16 +132,54 @@ private:
         CLI::App* const command =
             AddCommand("identify", "Tell the type of files by their root tags alone", kIdentifyExamples);
         command->add_option("FILE", identify.files, "The files")->required()->type_name("");
-        command->add_flag("--json", identify.isJson, kJsonHelp);
-        command->callback([this] { chosen = [this] { return Identify(identify, console); }; });
+        Finish(command, identify, Identify);
     }
 
     void AddShow()
     {
         CLI::App* const command = AddCommand("show", "Show what a message says, or where it is broken", kShowExamples);
         command->add_option("FILE", show.file, "The message")->required()->type_name("");
-        command->add_flag("--json", show.isJson, kJsonHelp);
-        command->callback([this] { chosen = [this] { return Show(show, console); }; });
+        Finish(command, show, Show);
+    }
+
+    void AddSettings()
+    {
+        CLI::App* const group =
+            AddCommand("settings", "Read and write the settings of applications", kSettingsExamples);
+        group->require_subcommand(1);
+        AddSettingsGet(AddCommand("get", "Print the value that is in force", kSettingsExamples, group));
+        AddSettingsSet(AddCommand("set", "Write a value", kSettingsExamples, group));
+        AddSettingsList(AddCommand("list", "List the values, the user's and the machine's", kSettingsExamples, group));
+    }
+
+    void AddSettingName(CLI::App* command)
+    {
+        command->add_option("APP", settings.application, "The application, such as corvo32")->required()->type_name("");
+        command->add_option("SECTION", settings.section, "The section, such as frmsplash")->required()->type_name("");
+        command->add_option("KEY", settings.key, "The key, such as ServerName")->required()->type_name("");
+    }
+
+    void AddSettingsGet(CLI::App* command)
+    {
+        AddSettingName(command);
+        Finish(command, settings, GetSetting);
+    }
+
+    void AddSettingsSet(CLI::App* command)
+    {
+        AddSettingName(command);
+        command->add_option("VALUE", settings.value, "The value; without it, a line of the\nstandard input")
+            ->type_name("");
+        CLI::Option* const user =
+            command->add_flag("--user", settings.isForUser, "Write it for this user; this is the default");
+        command->add_flag("--machine", settings.isMachineWide, "Write it for every user")->excludes(user);
+        Finish(command, settings, SetSetting);
+    }
+
+    void AddSettingsList(CLI::App* command)
+    {
+        command->add_option("APP", settings.application, "The application; all without it")->type_name("");
+        Finish(command, settings, ListSettings);
     }
 
     const Console& console;
@@ -126,6 +187,7 @@ private:
     ScanOptions scan;
     IdentifyOptions identify;
     ShowOptions show;
+    SettingsOptions settings;
     std::function<Status()> chosen;
 };
 
