@@ -2,6 +2,7 @@
 
 #include <algorithm>
 
+#include "DisplayText.h"
 #include "varnex3/core/Error.h"
 #include "varnex3/services/ModRegistry.h"
 
@@ -32,7 +33,7 @@ bool StartsWith(TextView text, TextView start) { return EqualsIgnoringCase(text.
 bool HasIgnoringCase(TextView text, TextView part)
 {
     const auto isSame = [](char16_t a, char16_t b) { return ToLower(a) == ToLower(b); };
-    return !std::ranges::search(text, part, isSame).empty();
+    return std::search(text.begin(), text.end(), part.begin(), part.end(), isSame) != text.end();
 }
 
 // Nothing when the value does not belong to an application's section.
@@ -86,6 +87,15 @@ bool IsPassword(TextView key)
     constexpr TextView kEnd = u"Pwd";
     const bool endsInPwd = key.size() >= kEnd.size() && EqualsIgnoringCase(key.substr(key.size() - kEnd.size()), kEnd);
     return endsInPwd || HasIgnoringCase(key, u"Password");
+}
+
+bool IsValue(TextView key, TextView value) { return !IsPassword(key) || !value.empty(); }
+
+std::string ShownValue(TextView key, TextView value)
+{
+    if (IsPassword(key))
+        return value.empty() ? "not set" : "set";
+    return Printable(value);
 }
 
 std::optional<FoundSetting> FindSetting(const SettingName& name)

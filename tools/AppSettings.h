@@ -2,6 +2,7 @@
 #pragma once
 
 #include <optional>
+#include <string>
 #include <vector>
 
 #include "varnex3/services/Settings.h"
@@ -36,6 +37,12 @@ Name ScopeName(RegistryRoot scope);
 // Whether the value is nobody's to see: SAPwd, TabletMasterSAPwd, whatever ends in Pwd or has Password in it, in any
 // letter case.
 bool IsPassword(TextView key);
+
+// Whether such a value is one: an empty password is none.
+bool IsValue(TextView key, TextView value);
+
+// A value as it may be shown: printable, and of a password whether it is set.
+std::string ShownValue(TextView key, TextView value);
 
 // Never writes: the migration that a host's look-up may do is left out.
 std::optional<FoundSetting> FindSetting(const SettingName& name);

@@ -17,9 +17,6 @@ namespace {
 using Json = nlohmann::ordered_json;
 using Files = std::vector<SettingsFile>;
 
-constexpr Name kSet = "set";
-constexpr Name kNotSet = "not set";
-
 // An argument, which may be a password: it is not told when it is refused.
 Text TextOf(const std::string& argument)
 {
@@ -42,36 +39,31 @@ Json JsonOf(const SettingName& name)
 }
 
 // A password has only whether it is set.
-void AddValue(Json& json, const SettingName& name, const Text& value)
+void AddValue(Json& json, TextView key, const Text& value)
 {
-    json["isSet"] = !IsPassword(name.key) || !value.empty();
-    if (!IsPassword(name.key))
+    json["isSet"] = IsValue(key, value);
+    if (!IsPassword(key))
         json["value"] = ToUtf8(value);
 }
 
-std::string ShownValue(const SettingName& name, const Text& value)
-{
-    if (IsPassword(name.key))
-        return std::string(value.empty() ? kNotSet : kSet);
-    return Printable(value);
-}
-
-Status StatusFor(const Files& files) { return DamagedLineCount(files) == 0 ? Status::Fine : Status::Findings; }
+Status StatusFor(const Files& files) { return DamagedLines(files).empty() ? Status::Fine : Status::Findings; }
 
 void ReportDamage(const Files& files, bool isJson, const Console& console)
 {
     if (isJson)
-        PrintDamagedLinesAsJson(console.out, files);
+        for (const Json& line : DamagedLinesAsJson(files))
+            console.out.Line(JsonLine(line));
     else
-        PrintDamagedLines(console.errors, files);
+        for (const std::string& line : DamagedLines(files))
+            console.errors.Paragraph(line, 4);
 }
 
 void PrintFound(const SettingName& name, const std::optional<FoundSetting>& found, const Console& console)
 {
     if (found)
-        console.out.Line(ShownValue(name, found->value));
+        console.out.Line(ShownValue(name.key, found->value));
     else if (IsPassword(name.key))
-        console.out.Line(kNotSet);
+        console.out.Line(ShownValue(name.key, {}));
     else
         console.errors.Paragraph("varnex3: " + Printable(InWords(name)) + " is not set", 4);
 }
@@ -82,7 +74,7 @@ void PrintFoundAsJson(const SettingName& name, const std::optional<FoundSetting>
     json["isSet"] = found.has_value();
     if (found) {
         json["scope"] = ScopeName(found->scope);
-        AddValue(json, name, found->value);
+        AddValue(json, name.key, found->value);
     }
     console.out.Line(JsonLine(json));
 }
@@ -129,7 +121,7 @@ void PrintTable(const std::vector<ListedSetting>& settings, Terminal& terminal)
         table.Add({{Printable(setting.name.application), style},
                    {Printable(setting.name.section), style},
                    {Printable(setting.name.key), style},
-                   {ShownValue(setting.name, setting.display), style},
+                   {ShownValue(setting.name.key, setting.display), style},
                    {scope, style}});
     }
     table.Print(terminal);
@@ -151,7 +143,7 @@ void PrintListAsJson(const std::vector<ListedSetting>& settings, Terminal& termi
         Json json = JsonOf(setting.name);
         json["scope"] = ScopeName(setting.scope);
         json["isInForce"] = setting.isInForce;
-        AddValue(json, setting.name, setting.display);
+        AddValue(json, setting.name.key, setting.display);
         terminal.Line(JsonLine(json));
     }
 }
@@ -169,7 +161,7 @@ Status GetSetting(const SettingsOptions& options, const Console& console)
     else
         PrintFound(name, found, console);
     ReportDamage(files, options.isJson, console);
-    const bool isSet = found && !(IsPassword(name.key) && found->value.empty());
+    const bool isSet = found && IsValue(name.key, found->value);
     return isSet ? StatusFor(files) : Status::Findings;
 }
 

@@ -3,11 +3,12 @@
 #include <nlohmann/json.hpp>
 
 #include "DisplayText.h"
-#include "MessageFile.h"
 
 namespace varnex3::tool {
 
 namespace {
+
+using Json = nlohmann::ordered_json;
 
 SettingsFile ReadSettingsFile(RegistryRoot scope)
 {
@@ -43,27 +44,23 @@ void RequireReadable(const std::vector<SettingsFile>& files)
             throw *file.failure;
 }
 
-std::size_t DamagedLineCount(const std::vector<SettingsFile>& files)
+std::vector<std::string> DamagedLines(const std::vector<SettingsFile>& files)
 {
-    std::size_t count = 0;
-    ForEachDamagedLine(files, [&](const Text&, const DamagedLine&) { ++count; });
-    return count;
+    std::vector<std::string> lines;
+    ForEachDamagedLine(files, [&](const Text& path, const DamagedLine& line) {
+        lines.push_back(Printable(path) + ":" + std::to_string(line.number) + ": " + Printable(line.reason));
+    });
+    return lines;
 }
 
-void PrintDamagedLines(Terminal& terminal, const std::vector<SettingsFile>& files)
+std::vector<Json> DamagedLinesAsJson(const std::vector<SettingsFile>& files)
 {
+    std::vector<Json> lines;
     ForEachDamagedLine(files, [&](const Text& path, const DamagedLine& line) {
-        terminal.Paragraph(Printable(path) + ":" + std::to_string(line.number) + ": " + Printable(line.reason), 4);
+        const Json error{{"kind", "damaged"}, {"line", line.number}, {"reason", ToUtf8(line.reason)}};
+        lines.push_back({{"FilePath", ToUtf8(path)}, {"error", error}});
     });
-}
-
-void PrintDamagedLinesAsJson(Terminal& terminal, const std::vector<SettingsFile>& files)
-{
-    ForEachDamagedLine(files, [&](const Text& path, const DamagedLine& line) {
-        terminal.Line(
-            JsonLine({{"FilePath", ToUtf8(path)},
-                      {"error", {{"kind", "damaged"}, {"line", line.number}, {"reason", ToUtf8(line.reason)}}}}));
-    });
+    return lines;
 }
 
 } // namespace varnex3::tool
