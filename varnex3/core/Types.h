@@ -164,7 +164,7 @@ struct ParameterOf<T*> // an optional one
     static constexpr bool isOutput = true;
 };
 template <class T>
-struct ParameterOf<ByReference<T>>
+struct ParameterOf<const ByReference<T>&>
 {
     using Value = T;
     static constexpr bool isByReference = true;

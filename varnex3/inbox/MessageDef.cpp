@@ -91,7 +91,7 @@ void MessageDef::SourceXML(Text value)
     bSourceIsCurrent = true;
 }
 
-Text MessageDef::ParseXML(const Text& sXML, const Text& sFileName_, ByReference<Text> sFilePath_)
+Text MessageDef::ParseXML(const Text& sXML, const Text& sFileName_, const ByReference<Text>& sFilePath_)
 {
     xml::Document loaded;
     if (loaded.LoadText(sXML)) {

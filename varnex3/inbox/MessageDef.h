@@ -30,7 +30,7 @@ class MessageDef final : public Record
         "that cannot be written, or a document that a failed ParseXML left empty, raises PathFileAccess (75) and "
         "leaves the old file as it was. The result is always empty.");
     VARNEX_METHOD(
-        Text, ParseXML, (const Text& sXML, const Text& sFileName, ByReference<Text> sFilePath),
+        Text, ParseXML, (const Text& sXML, const Text& sFileName, const ByReference<Text>& sFilePath),
         "Reads a message of any type. A text that is not well-formed sets ParseError and ErrorMessage and leaves "
         "everything else as it was. The result is always empty.");
     VARNEX_PROPERTY(Text, sRepairerID, RepairerID, "Identifier of the repairer.");
