@@ -41,7 +41,7 @@ void RequireReadable(const std::vector<SettingsFile>& files)
 {
     for (const SettingsFile& file : files)
         if (file.failure)
-            throw *file.failure;
+            throw Error(*file.failure);
 }
 
 std::vector<std::string> DamagedLines(const std::vector<SettingsFile>& files)
