@@ -27,10 +27,15 @@ endif()
 # A layer of the library: its objects, compiled with nothing but the layers below it on the link line, so that a
 # dependency that points up does not link.
 function(varnex3_layer name)
+    varnex3_substitute(${name} ${ARGN})
+    set_property(GLOBAL APPEND PROPERTY VARNEX3_LAYERS varnex3_${name})
+endfunction()
+
+# Objects that programs may link in a layer's place; the library itself does not have them.
+function(varnex3_substitute name)
     cmake_parse_arguments(ARG "" "" "SOURCES;USES" ${ARGN})
     add_library(varnex3_${name} OBJECT ${ARG_SOURCES})
     target_link_libraries(varnex3_${name} PRIVATE varnex3_build)
-    set_property(GLOBAL APPEND PROPERTY VARNEX3_LAYERS varnex3_${name})
     set(objects varnex3_${name})
     foreach(used IN LISTS ARG_USES)
         get_property(below GLOBAL PROPERTY VARNEX3_OBJECTS_${used})
