@@ -6,6 +6,7 @@
 #include <vector>
 
 #include "DisplayText.h"
+#include "DoctorCommand.h"
 #include "IdentifyCommand.h"
 #include "ScanCommand.h"
 #include "ScanReport.h"
@@ -43,6 +44,11 @@ constexpr const char* kSettingsExamples = R"(Examples:
   varnex3 settings set corvo32 frmsplash ServerName WORKSHOP1 --machine
   varnex3 settings set corvo32 frmsplash SAPwd < password.txt)";
 
+constexpr const char* kDoctorExamples = R"(Examples:
+  varnex3 doctor
+  varnex3 doctor > page-for-support.txt
+  varnex3 doctor --json | jq .database.server)";
+
 std::vector<std::string> SortKeys()
 {
     std::vector<std::string> keys;
@@ -75,6 +81,7 @@ public:
         AddIdentify();
         AddShow();
         AddSettings();
+        AddDoctor();
     }
 
     Status Run(int argumentCount, const char* const* arguments)
@@ -182,12 +189,18 @@ private:
         Finish(command, settings, ListSettings);
     }
 
+    void AddDoctor()
+    {
+        Finish(AddCommand("doctor", "Tell whether the database answers, and why not", kDoctorExamples), doctor, Doctor);
+    }
+
     const Console& console;
-    CLI::App app{"Reads Xalo messages.", "varnex3"};
+    CLI::App app{"Reads Xalo messages, and sees to settings and database.", "varnex3"};
     ScanOptions scan;
     IdentifyOptions identify;
     ShowOptions show;
     SettingsOptions settings;
+    DoctorOptions doctor;
     std::function<Status()> chosen;
 };
 

@@ -125,6 +125,11 @@ std::size_t DisplayWidth(std::string_view printable)
     return width;
 }
 
+std::string Plural(std::size_t count, const std::string& noun)
+{
+    return std::to_string(count) + " " + noun + (count == 1 ? "" : "s");
+}
+
 std::string Cut(std::string_view printable, std::size_t width)
 {
     if (DisplayWidth(printable) <= width)

@@ -22,6 +22,9 @@ std::string Printable(char32_t character);
 // The columns that a printable text takes: East Asian wide characters two, combining ones none.
 std::size_t DisplayWidth(std::string_view printable);
 
+// Plural(2, "file") is "2 files".
+std::string Plural(std::size_t count, const std::string& noun);
+
 // At most that many columns: what is cut off is marked by an ellipsis. Cut("registration", 6) is "regis…".
 std::string Cut(std::string_view printable, std::size_t width);
 

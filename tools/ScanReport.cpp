@@ -30,11 +30,6 @@ double NumberOrLast(const Text& text)
     }
 }
 
-std::string Plural(std::size_t count, const std::string& noun)
-{
-    return std::to_string(count) + " " + noun + (count == 1 ? "" : "s");
-}
-
 } // namespace
 
 std::span<const ScanColumn> ScanColumns()
