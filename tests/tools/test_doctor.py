@@ -18,7 +18,7 @@ DATABASE = SOURCE / "tests" / "database"
 sys.path.insert(0, str(DATABASE))
 from servers import TdsServer  # noqa: E402
 
-SECRET = "Ge;heim 4711"
+SECRET = "Ge;heim} 4711"
 DRIVERS = ("SQL Server", "SQL Native Client")
 
 
