@@ -52,6 +52,24 @@ private:
     std::string path = "/tmp/varnex3-drivers-XXXXXX";
 };
 
+// Runs a test case that is skipped otherwise, "[child] ...", in a process with drivers of its own. Whether it passed.
+inline bool PassesWithDrivers(const std::string& name, const std::string& drivers)
+{
+    std::string folder = "/tmp/varnex3-drivers-XXXXXX";
+    REQUIRE(mkdtemp(folder.data()) != nullptr);
+    WriteFile(folder + "/odbcinst.ini", drivers);
+    const std::string program = std::filesystem::read_symlink("/proc/self/exe").string();
+    FILE* const pipe = popen(("ODBCSYSINI=" + folder + " '" + program + "' -ns -tc='" + name + "' 2>&1").c_str(), "r");
+    REQUIRE(pipe != nullptr);
+    std::string output;
+    for (int c = fgetc(pipe); c != EOF; c = fgetc(pipe))
+        output += static_cast<char>(c);
+    pclose(pipe);
+    std::filesystem::remove_all(folder);
+    INFO(output);
+    return output.find("1 passed | 0 failed") != std::string::npos;
+}
+
 // Settings of a test's own that lead to a database.
 class DatabaseFolder
 {
