@@ -4,7 +4,7 @@ BUILD := build/release
 CMAKE_BUILD = cmake --build --preset $(1) --parallel $(JOBS)
 
 .DEFAULT_GOAL := build
-.PHONY: help setup build demo test sanitize bench format layout tidy docs install clean
+.PHONY: help setup build demo test sanitize threads bench format layout tidy docs install clean
 
 help: ## this list
 	@sed -n 's/^\([a-z]*\):.*## /\1\t/p' $(MAKEFILE_LIST) | expand -t 12
@@ -19,8 +19,9 @@ $(BUILD)/CMakeCache.txt: CMakePresets.json
 	@scripts/setup
 	@cmake --preset release
 
-demo: setup build ## build what is missing and summarise the sample inbox
-	@$(BUILD)/tools/varnex3 scan samples/inbox; status=$$?; test $$status -le 1
+demo: setup build ## build what is missing, summarise the sample inbox, show the doctor's page
+	@$(BUILD)/tools/varnex3 scan samples/inbox; test $$? -le 1
+	@echo; $(BUILD)/tools/varnex3 doctor; test $$? -le 1
 
 test: setup build ## build and run every test
 	@scripts/run_tests $(BUILD)
@@ -29,6 +30,11 @@ sanitize: setup ## build with the address and undefined-behaviour sanitizers and
 	@cmake --preset asan
 	@$(call CMAKE_BUILD,asan)
 	@scripts/run_tests build/asan
+
+threads: setup ## build with the thread sanitizer and run the tests of the database access
+	@cmake --preset tsan
+	@$(call CMAKE_BUILD,tsan) --target varnex3_test_services
+	@scripts/run_tests build/tsan services
 
 bench: setup ## measure against the peers, print the ratios
 	@scripts/setup bench

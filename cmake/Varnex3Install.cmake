@@ -17,6 +17,7 @@ install(FILES ${PROJECT_BINARY_DIR}/varnex3Config.cmake ${PROJECT_BINARY_DIR}/va
 
 # The prefix is found from where the file stands, so that an installed tree can be moved.
 file(RELATIVE_PATH up /${CMAKE_INSTALL_LIBDIR}/pkgconfig /)
+list(TRANSFORM CMAKE_DL_LIBS PREPEND -l OUTPUT_VARIABLE VARNEX3_PC_LIBS)
 set(PKGCONFIG_PREFIX "\${pcfiledir}/${up}")
 foreach(package varnex3 varnex3_c)
     configure_file(cmake/${package}.pc.in ${PROJECT_BINARY_DIR}/${package}.pc @ONLY)

@@ -18,6 +18,7 @@ BINARY = pathlib.Path(os.environ["VARNEX3_BINARY_DIR"])
 LAYERS = {  # each with the layers it may use
     "xml": {"xml"},
     "core": {"xml", "core"},
+    "services": {"xml", "core", "services"},
     "inbox": {"xml", "core", "inbox"},
 }
 
