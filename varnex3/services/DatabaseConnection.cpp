@@ -6,7 +6,11 @@ namespace varnex3 {
 
 namespace {
 
-SQLPOINTER AsPointer(std::chrono::seconds limit) { return reinterpret_cast<SQLPOINTER>(limit.count()); }
+// Attributes that are numbers travel as pointers.
+SQLPOINTER AsPointer(std::chrono::seconds limit)
+{
+    return reinterpret_cast<SQLPOINTER>(limit.count()); // NOLINT(performance-no-int-to-ptr): the interface is so
+}
 
 const OdbcFunctions& RequiredOdbc()
 {

@@ -48,8 +48,9 @@ bool ResultReader::ReadRow(RowSet::Row& row)
     if (result == SQL_NO_DATA)
         return false;
     row.clear();
-    for (SQLUSMALLINT i = 0; i < columns.size(); ++i)
-        row.push_back(Cell(static_cast<SQLUSMALLINT>(i + 1), columns[i].type));
+    SQLUSMALLINT number = 0; // they are counted from 1
+    for (const Column& column : columns)
+        row.push_back(Cell(++number, column.type));
     return true;
 }
 
