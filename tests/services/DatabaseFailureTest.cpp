@@ -1,4 +1,6 @@
 // Databases that cannot be reached or break: nothing hangs, and what comes next is tried.
+#include <tuple>
+
 #include <arpa/inet.h>
 #include <netinet/in.h>
 #include <sys/socket.h>
@@ -64,7 +66,7 @@ public:
         REQUIRE(getsockname(listener, reinterpret_cast<sockaddr*>(&address), &length) == 0);
         for (int& client : clients) {
             client = socket(AF_INET, SOCK_STREAM | SOCK_NONBLOCK, 0);
-            connect(client, reinterpret_cast<const sockaddr*>(&address), length);
+            std::ignore = connect(client, reinterpret_cast<const sockaddr*>(&address), length);
         }
     }
     ~FullPort()
@@ -197,7 +199,7 @@ TEST_CASE("A connection that broke while it was idle fails one call at most")
     CHECK(Called(u"hangUpAfter").lID == 42);
     Call(u"rowSet"); // may fail: nobody noticed
     CHECK(Called(u"rowSet").lID == 42);
-    std::thread([] { Called(u"closeIdleConnections"); }).join();
+    std::thread([] { const Called called(u"closeIdleConnections"); }).join();
     Call(u"rowSet");
     CHECK(Called(u"rowSet").lID == 42);
 }
