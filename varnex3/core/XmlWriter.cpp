@@ -30,12 +30,24 @@ void XmlWriter::StartLine()
         Put(TextView(u"\t"));
 }
 
+void XmlWriter::PutStartTag(Name element)
+{
+    Put(TextView(u"<"));
+    Put(element);
+    Put(TextView(u">"));
+}
+
+void XmlWriter::PutEndTag(Name element)
+{
+    Put(TextView(u"</"));
+    Put(element);
+    Put(TextView(u">"));
+}
+
 void XmlWriter::Open(Name group)
 {
     StartLine();
-    Put(TextView(u"<"));
-    Put(group);
-    Put(TextView(u">"));
+    PutStartTag(group);
     EndLine();
     ++level;
 }
@@ -44,9 +56,7 @@ void XmlWriter::Close(Name group)
 {
     --level;
     StartLine();
-    Put(TextView(u"</"));
-    Put(group);
-    Put(TextView(u">"));
+    PutEndTag(group);
     EndLine();
 }
 
@@ -68,13 +78,9 @@ void XmlWriter::CloseUnlessEmpty(const Mark& mark)
 void XmlWriter::Always(Name element, TextView value)
 {
     StartLine();
-    Put(TextView(u"<"));
-    Put(element);
-    Put(TextView(u">"));
+    PutStartTag(element);
     Put(value);
-    Put(TextView(u"</"));
-    Put(element);
-    Put(TextView(u">"));
+    PutEndTag(element);
     EndLine();
 }
 
@@ -107,9 +113,7 @@ void XmlWriter::AlwaysWithAttribute(Name element, Name attribute, TextView about
     Put(about);
     Put(TextView(u"\">"));
     Put(value);
-    Put(TextView(u"</"));
-    Put(element);
-    Put(TextView(u">"));
+    PutEndTag(element);
     EndLine();
 }
 

@@ -62,6 +62,8 @@ private:
 
     void StartLine();
     void EndLine() { Put(TextView(u"\r\n")); }
+    void PutStartTag(Name element);
+    void PutEndTag(Name element);
     void Put(TextView text);
     void Put(Name name);
 

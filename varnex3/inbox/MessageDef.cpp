@@ -10,7 +10,7 @@ namespace {
 
 using enum XaloMessageTypeEnum;
 
-struct MessageType_
+struct TypeRow
 {
     XaloMessageTypeEnum id;
     TextView recognised; // the root element that is read
@@ -18,7 +18,7 @@ struct MessageType_
     TextView description;
 };
 
-constexpr MessageType_ kMessageTypes[] = {
+constexpr TypeRow kMessageTypes[] = {
     {Xalo_Unknown, u"Xalo_Unknown", u"Xalo_Unknown", u"Unknown"},
     {Xalo_RequestForQuote, u"Xalo_RequestForQuote", u"Xalo_RequestForQuote", u"Request For Quote"},
     {Xalo_ScopeOfWork, u"Xalo_ScopeOfWork", u"Xalo_ScopeOfWork", u"Scope of Work"},
@@ -38,9 +38,9 @@ constexpr MessageType_ kMessageTypes[] = {
     {Xalo_VarnexReferenceData, u"Xalo_VarnexReferenceData", u"Xalo_VarnexReferenceData", u"Varnex Reference Data"},
 };
 
-const MessageType_* Find(XaloMessageTypeEnum id)
+const TypeRow* Find(XaloMessageTypeEnum id)
 {
-    for (const MessageType_& type : kMessageTypes)
+    for (const TypeRow& type : kMessageTypes)
         if (type.id == id)
             return &type;
     return nullptr;
@@ -55,7 +55,7 @@ Text MessageDef::MessageType() { return sMessageType; }
 void MessageDef::MessageType(Text value)
 {
     sMessageType = std::move(value);
-    for (const MessageType_& type : kMessageTypes)
+    for (const TypeRow& type : kMessageTypes)
         if (type.recognised == sMessageType)
             eMessageTypeID = type.id; // an unknown name leaves the type as it was
 }
@@ -65,13 +65,13 @@ XaloMessageTypeEnum MessageDef::MessageTypeID() { return eMessageTypeID; }
 void MessageDef::MessageTypeID(XaloMessageTypeEnum value)
 {
     eMessageTypeID = value;
-    if (const MessageType_* const type = Find(value))
+    if (const TypeRow* const type = Find(value))
         sMessageType = type->written; // any other number leaves the name as it was
 }
 
 Text MessageDef::MessageDescription()
 {
-    if (const MessageType_* const type = Find(eMessageTypeID))
+    if (const TypeRow* const type = Find(eMessageTypeID))
         sMessageDescription = type->description;
     return sMessageDescription;
 }
