@@ -30,7 +30,8 @@ int TeachWindows1252(void*, const XML_Char* name, XML_Encoding* encoding)
     return XML_STATUS_OK;
 }
 
-void Hush(void*, const char*, ...) {} // libxml2 writes some errors to the console otherwise
+// libxml2 writes some errors to the console otherwise. NOLINTNEXTLINE(cert-dcl50-cpp): its type for the purpose
+void Hush(void*, const char*, ...) {}
 
 const char* Utf8(const xmlChar* text) { return text == nullptr ? "" : reinterpret_cast<const char*>(text); }
 

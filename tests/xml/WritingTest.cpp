@@ -21,7 +21,7 @@ std::u16string Outline(const Node& top)
         if (node.Type() > NodeType::Element)
             outline += u":" + node.Text();
         outline += u"\n";
-        if (const Node next = node.NextSibling(); next && indent != u"")
+        if (const Node next = node.NextSibling(); next && !indent.empty())
             open.emplace_back(next, indent);
         if (const Node child = node.FirstChild())
             open.emplace_back(child, indent + u".");
