@@ -4,7 +4,7 @@ BUILD := build/release
 CMAKE_BUILD = cmake --build --preset $(1) --parallel $(JOBS)
 
 .DEFAULT_GOAL := build
-.PHONY: help setup build demo test sanitize threads bench format layout tidy docs install clean
+.PHONY: help setup build demo test sanitize threads windows bench format layout tidy docs install clean
 
 help: ## this list
 	@sed -n 's/^\([a-z]*\):.*## /\1\t/p' $(MAKEFILE_LIST) | expand -t 12
@@ -35,6 +35,10 @@ threads: setup ## build with the thread sanitizer and run the tests of the datab
 	@cmake --preset tsan
 	@$(call CMAKE_BUILD,tsan) --target varnex3_test_services
 	@scripts/run_tests build/tsan services
+
+windows: build ## build the component for 32-bit and 64-bit Windows into build/win32 and build/win64
+	@scripts/setup windows
+	@for bits in win32 win64; do cmake --preset $$bits && $(call CMAKE_BUILD,$$bits) || exit; done
 
 bench: setup ## measure against the peers, print the ratios
 	@scripts/setup bench

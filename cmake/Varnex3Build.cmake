@@ -24,6 +24,20 @@ if(VARNEX3_SANITIZE)
     add_link_options(-fsanitize=address,undefined)
 endif()
 
+# A library of headers alone. For another system than this one its folder is shown by itself: the folder that it stands in
+# has this system's headers, too.
+function(varnex3_find_headers target package version folder)
+    if(NOT CMAKE_CROSSCOMPILING)
+        find_package(${package} ${version} REQUIRED GLOBAL)
+        return()
+    endif()
+    find_path(${package}_FOLDER ${folder} PATHS /usr/include NO_DEFAULT_PATH NO_CMAKE_FIND_ROOT_PATH REQUIRED)
+    file(MAKE_DIRECTORY ${PROJECT_BINARY_DIR}/headers)
+    file(CREATE_LINK ${${package}_FOLDER}/${folder} ${PROJECT_BINARY_DIR}/headers/${folder} SYMBOLIC)
+    add_library(${target} INTERFACE IMPORTED GLOBAL)
+    target_include_directories(${target} SYSTEM INTERFACE ${PROJECT_BINARY_DIR}/headers)
+endfunction()
+
 # A layer of the library: its objects, compiled with nothing but the layers below it on the link line, so that a
 # dependency that points up does not link.
 function(varnex3_layer name)

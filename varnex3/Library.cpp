@@ -1,12 +1,19 @@
 #include "varnex3/Library.h"
 
 #include <algorithm>
+#include <array>
 
-#include "varnex3/varnex3.h"
+#include "varnex3/PublicClasses.h"
 
 namespace varnex3 {
 
 namespace {
+
+template <class... Class>
+std::array<const ClassInfo*, sizeof...(Class)> InfosOf(ClassList<Class...>)
+{
+    return {&Class::Info()...};
+}
 
 std::vector<const EnumInfo*> CollectEnumerations()
 {
@@ -28,29 +35,7 @@ std::vector<const EnumInfo*> CollectEnumerations()
 
 std::span<const ClassInfo* const> Classes()
 {
-    static const ClassInfo* const classes[] = {
-        &modGeneral::Info(),
-        &modFunctions::Info(),
-        // envelope
-        &VersionDef::Info(),
-        &SourceDef::Info(),
-        &DestinationDef::Info(),
-        &XaloBase::Info(),
-        // parties
-        &InsurerDetailDef::Info(),
-        &RepairerDef::Info(),
-        &RepairerOptDef::Info(),
-        &InsurerDef::Info(),
-        &InsurerOptDef::Info(),
-        // claim, vehicle and customer
-        &ClaimHeaderDef::Info(),
-        &VehicleDef::Info(),
-        &CustomerDef::Info(),
-        &PersonalNameDef::Info(),
-        // inbox
-        &MessageDef::Info(),
-        &Xalo_Messages::Info(),
-    };
+    static const auto classes = InfosOf(PublicClasses());
     return classes;
 }
 

@@ -1,0 +1,39 @@
+// Every public class and module, as types, folder by folder: what the faces offer, in the order of the documentation.
+//
+// A new class has one line here. Library.h gives the same list as plain data.
+#pragma once
+
+#include "varnex3/varnex3.h"
+
+namespace varnex3 {
+
+template <class... Class>
+struct ClassList
+{};
+
+template <class... Lists>
+struct JoinedLists;
+template <class... A>
+struct JoinedLists<ClassList<A...>>
+{
+    using List = ClassList<A...>;
+};
+template <class... A, class... B, class... Rest>
+struct JoinedLists<ClassList<A...>, ClassList<B...>, Rest...> : JoinedLists<ClassList<A..., B...>, Rest...>
+{};
+
+using ModuleList = ClassList<modGeneral, modFunctions>;
+
+using CoreClasses = ClassList<
+    // envelope
+    VersionDef, SourceDef, DestinationDef, XaloBase,
+    // parties
+    InsurerDetailDef, RepairerDef, RepairerOptDef, InsurerDef, InsurerOptDef,
+    // claim, vehicle and customer
+    ClaimHeaderDef, VehicleDef, CustomerDef, PersonalNameDef>;
+
+using InboxClasses = ClassList<MessageDef, Xalo_Messages>;
+
+using PublicClasses = JoinedLists<ModuleList, CoreClasses, InboxClasses>::List;
+
+} // namespace varnex3
