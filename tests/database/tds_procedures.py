@@ -175,6 +175,7 @@ PROCEDURES = (
         ),
         what_was_taken,
     ),
+    Procedure("takeText", (takes("@Text", "nvarchar(max)"), *OUTPUTS), what_was_taken),
     Procedure("takeBit", (takes("@Bit", "bit"), *OUTPUTS), what_was_taken),
     Procedure(
         "takeTexts",

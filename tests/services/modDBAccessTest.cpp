@@ -7,6 +7,7 @@
 #include "tests/services/DatabaseServers.h"
 #include "varnex3/services/DatabaseConnection.h"
 #include "varnex3/services/ProcedureCall.h"
+#include "varnex3/services/ProcedureParameter.h"
 
 using namespace varnex3;
 using namespace std::chrono_literals;
@@ -259,6 +260,23 @@ TEST_CASE("Texts go to inputs only, in the server's order; those left over are i
     CHECK(Sent(database, u"takeNumberAndText", u"") == "nvarchar(1)=null nvarchar(1)=null");
     CHECK(Sent(database, u"takeNumberAndText", u"\ta") == "int(4)=0 nvarchar(1)=\"a\"");
     CHECK(Called(u"takeNothing", u"1\t2").rowSet->IsOpen());
+}
+
+TEST_CASE(
+    "A text of 2 GB is cut where the size is declared, and refused where it is not: the server has no room for it")
+{
+    const TdsDatabase database;
+    Text texts(kLongestText + 1, u'x');
+    texts[1] = u'\t';
+    texts[0] = u'7';
+    texts += u"yy";
+    CHECK(Sent(database, u"takeNumberAndText", texts) == "int(4)=7 nvarchar(2)=\"xx\"");
+    texts[1] = u'x';
+    CHECK(Failure(u"takeText", texts)
+          == "6 -1 takeText: @Text: '" + std::string("7") + std::string(59, 'x')
+                 + "...' has 1073741826 characters, more than the 1073741823 of a database's longest text");
+    CHECK(Called(u"rowSet").lID == 42); // and the connection is of use
+    CHECK(database.server.Count("login") == 1);
 }
 
 TEST_CASE("What does not convert is raised before the call, and names procedure, parameter and value")

@@ -245,7 +245,7 @@ ProcedureCall::ProcedureCall(DatabaseConnection& connection_, TextView name_) : 
     }
 }
 
-void ProcedureCall::GiveTexts(const std::vector<Text>& texts)
+void ProcedureCall::GiveTexts(const std::vector<TextView>& texts)
 {
     std::size_t i = 0;
     for (ProcedureParameter& parameter : parameters) {

@@ -20,7 +20,7 @@ public:
 
     // Gives the texts to the input parameters, in the server's order, as ConvertedText says. Texts that are left over
     // are ignored; parameters that are left over keep no value.
-    void GiveTexts(const std::vector<Text>& texts);
+    void GiveTexts(const std::vector<TextView>& texts);
 
     // Runs the procedure and reads everything that it answers: the first row set, or one that is not open when there
     // was none, and the outputs. An input without a value takes the procedure's

@@ -2,6 +2,7 @@
 
 #include <algorithm>
 #include <array>
+#include <string>
 
 #include "varnex3/core/Conversions.h"
 #include "varnex3/core/Error.h"
@@ -76,11 +77,18 @@ Variant Moment(TextView text, std::int64_t)
     return UnlessMismatch([&] { return Variant(DateFrom(text)); }, Empty);
 }
 Variant Flag(TextView text, std::int64_t) { return ToBoolean(Text(text)); }
+Variant AsItIs(TextView text, std::int64_t)
+{
+    if (text.size() > kLongestText)
+        throw Error(ErrorNumber::Overflow, {},
+                    Quoted(text) + u" has " + ToText(std::to_string(text.size())) + u" characters, more than the "
+                        + ToText(std::to_string(kLongestText)) + u" of a database's longest text");
+    return Text(text);
+}
 Variant Cut(TextView text, std::int64_t size)
 {
-    return Text(size == kUnlimitedSize ? text : text.substr(0, static_cast<std::size_t>(size)));
+    return size == kUnlimitedSize ? AsItIs(text, size) : Text(text.substr(0, static_cast<std::size_t>(size)));
 }
-Variant AsItIs(TextView text, std::int64_t) { return Text(text); }
 
 struct ConversionRow
 {

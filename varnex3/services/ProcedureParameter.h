@@ -51,6 +51,9 @@ enum class ParameterDirection : std::int16_t
 
 inline constexpr std::int64_t kUnlimitedSize = 2147483647;
 
+// The longest text that a database takes, in characters of 16 bits: 2 GB less one byte.
+inline constexpr std::size_t kLongestText = (std::size_t{1} << 30) - 1;
+
 struct ProcedureParameter
 {
     Text name; // u"@ID"
@@ -75,7 +78,8 @@ DatabaseType DatabaseTypeOf(std::int16_t odbcType, TextView typeName);
 // | 129, 200                         | the text cut to the declared size, whole when that is unlimited              |
 // | any other                        | the text                                                                     |
 //
-// Numbers, dates and Booleans are read as Conversions.h says. A number outside its integer type raises Overflow.
+// Numbers, dates and Booleans are read as Conversions.h says. A number outside its integer type raises Overflow, and so
+// does a text of more than kLongestText characters that is not cut.
 Variant ConvertedText(TextView text, DatabaseType type, std::int64_t size);
 
 } // namespace varnex3

@@ -95,16 +95,16 @@ void DropConnection()
 }
 
 // The texts between the tabs; an empty text has none.
-std::vector<Text> SplitAtTabs(TextView text)
+std::vector<TextView> SplitAtTabs(TextView text)
 {
-    std::vector<Text> parts;
+    std::vector<TextView> parts;
     if (text.empty())
         return parts;
     for (std::size_t tab = text.find(u'\t'); tab != TextView::npos; tab = text.find(u'\t')) {
-        parts.emplace_back(text.substr(0, tab));
+        parts.push_back(text.substr(0, tab));
         text.remove_prefix(tab + 1);
     }
-    parts.emplace_back(text);
+    parts.push_back(text);
     return parts;
 }
 
