@@ -45,7 +45,7 @@ function(varnex3_layer name)
     set_property(GLOBAL APPEND PROPERTY VARNEX3_LAYERS varnex3_${name})
 endfunction()
 
-# Objects that programs may link in a layer's place; the library itself does not have them.
+# Objects that programs may link beside a layer or in its place; the library itself does not have them.
 function(varnex3_substitute name)
     cmake_parse_arguments(ARG "" "" "SOURCES;USES" ${ARGN})
     add_library(varnex3_${name} OBJECT ${ARG_SOURCES})
