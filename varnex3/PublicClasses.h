@@ -32,8 +32,10 @@ using CoreClasses = ClassList<
     // claim, vehicle and customer
     ClaimHeaderDef, VehicleDef, CustomerDef, PersonalNameDef>;
 
+using NoticesClasses = ClassList<VarnexReferenceDataEnum>;
+
 using InboxClasses = ClassList<MessageDef, Xalo_Messages>;
 
-using PublicClasses = JoinedLists<ModuleList, CoreClasses, InboxClasses>::List;
+using PublicClasses = JoinedLists<ModuleList, CoreClasses, NoticesClasses, InboxClasses>::List;
 
 } // namespace varnex3

@@ -22,6 +22,7 @@
 #include "varnex3/core/modGeneral.h"
 #include "varnex3/inbox/MessageDef.h"
 #include "varnex3/inbox/Xalo_Messages.h"
+#include "varnex3/notices/VarnexReferenceDataEnum.h"
 #include "varnex3/services/ModRegistry.h"
 #include "varnex3/services/Settings.h"
 #include "varnex3/services/modDBAccess.h"

@@ -113,6 +113,12 @@ TEST_CASE("Every class is made new, by its own name, and separately")
     }
 }
 
+TEST_CASE("One class is predeclared; modules and the others are not")
+{
+    for (const ClassInfo* const info : Classes())
+        CHECK(info->isPredeclared == (info->name == "VarnexReferenceDataEnum"));
+}
+
 TEST_CASE("Every class but the lists and the summary has Serialise and ParseXML first")
 {
     for (const ClassInfo* const info : Classes()) {

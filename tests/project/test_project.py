@@ -19,6 +19,7 @@ LAYERS = {  # each with the layers it may use
     "xml": {"xml"},
     "core": {"xml", "core"},
     "services": {"xml", "core", "services"},
+    "notices": {"xml", "core", "notices"},
     "inbox": {"xml", "core", "inbox"},
 }
 

@@ -101,6 +101,7 @@ struct ClassInfo
     Name doc;
     std::span<const Member> members;
     Ref<Record> (*create)() = nullptr; // null for a module
+    bool isPredeclared = false;        // hosts may use its name without creating an object
 
     constexpr bool IsModule() const { return create == nullptr; }
 };

@@ -262,13 +262,19 @@ Ref<Record> Create()
 }
 
 template <class T>
+concept IsPredeclared = requires
+{
+    T::kIsPredeclared;
+};
+
+template <class T>
 const ClassInfo& InfoOf()
 {
     static_assert(!HasLateRow<T::kLastRow, T>(std::make_integer_sequence<int, 40>()),
                   "a row stands after the end of its class");
     static_assert(HasDistinctNames(kMembers<T>), "two members have the same name but for the case of letters");
     if constexpr (std::is_base_of_v<Record, T>) {
-        static constexpr ClassInfo info{T::ClassName, T::ClassDoc, kMembers<T>, &Create<T>};
+        static constexpr ClassInfo info{T::ClassName, T::ClassDoc, kMembers<T>, &Create<T>, IsPredeclared<T>};
         return info;
     } else {
         static constexpr ClassInfo info{T::ClassName, T::ClassDoc, kMembers<T>, nullptr};
@@ -298,6 +304,9 @@ public:                                                                         
 #define VARNEX_RECORD_END                                                                                              \
 public:                                                                                                                \
     static constexpr int kLastRow = __LINE__
+
+// In a class that hosts may use by its name alone, without creating an object.
+#define VARNEX_PREDECLARED static constexpr bool kIsPredeclared = true
 
 // In the class's source file.
 #define VARNEX_DEFINE(Name_)                                                                                           \

@@ -1,0 +1,7 @@
+#include "varnex3/notices/VarnexReferenceDataEnum.h"
+
+namespace varnex3 {
+
+VARNEX_DEFINE(VarnexReferenceDataEnum);
+
+} // namespace varnex3
