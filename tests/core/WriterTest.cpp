@@ -16,6 +16,7 @@ template <int Level>
 struct Written
 {
     static constexpr int kLevel = Level;
+    static constexpr Name ClassName = "Written";
     std::function<void(XmlWriter&)> write;
     void Write(XmlWriter& xml) const { write(xml); }
 };

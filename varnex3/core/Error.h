@@ -33,6 +33,7 @@ enum class ErrorNumber : std::int32_t
     DuplicateKey = 457,
     KeyNotFound = 32811,
     FolderMissing = 30030,
+    PartNumberMissing = 30101,
 };
 
 // What went wrong: Number says which kind, Source which class and operation raised it ("SourceDef.ParseXML",

@@ -85,13 +85,19 @@ Ref<T> New()
     return Ref<T>(new T);
 }
 
-// A child of a record: made on first use, and made again when it is used after it was set to nothing.
-template <class T>
+// A child of a record: made on first use, by a function of its own where it is to start with other values than its
+// class's. One that is set to nothing is a new one of its class.
+template <class T, Ref<T> (*Make)() = &New<T>>
 class Child
 {
 public:
     Child() = default;
-    Child(Ref<T> given) : record(std::move(given)) {}
+    Child(Ref<T> given) : record(std::move(given))
+    {
+        constexpr bool startsAsItsClass = Make == &New<T>;
+        if (!startsAsItsClass && !record)
+            record = New<T>();
+    }
 
     T* operator->() const { return Held().get(); }
     T& operator*() const { return *Held(); }
@@ -99,9 +105,12 @@ public:
     const Ref<T>& Held() const
     {
         if (!record)
-            record = New<T>();
+            record = Make();
         return record;
     }
+
+    // Whether it was made already. One that was not is what its first use makes.
+    bool IsMade() const { return static_cast<bool>(record); }
 
 private:
     mutable Ref<T> record;

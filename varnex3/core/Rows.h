@@ -46,12 +46,12 @@ struct Access<T>
     using Given = T;
     static Given Give(T member) { return member; }
 };
-template <class T>
-struct Access<Child<T>>
+template <class T, Ref<T> (*Make)()>
+struct Access<Child<T, Make>>
 {
     using Value = Ref<T>;
     using Given = const Ref<T>&;
-    static Given Give(const Child<T>& member) { return member.Held(); }
+    static Given Give(const Child<T, Make>& member) { return member.Held(); }
 };
 
 namespace rows {

@@ -37,6 +37,21 @@ constexpr TextView Trimmed(TextView text)
 // ASCII letters in lower case, everything else as it is.
 constexpr char16_t ToLower(char16_t c) { return c >= u'A' && c <= u'Z' ? static_cast<char16_t>(c + 32) : c; }
 
+// Letters of ASCII and Latin-1 in upper case, everything else as it is.
+constexpr char16_t ToUpper(char16_t c)
+{
+    const bool isLower = (c >= u'a' && c <= u'z') || (c >= u'\u00E0' && c <= u'\u00FE' && c != u'\u00F7');
+    if (isLower)
+        return static_cast<char16_t>(c - 32);
+    return c == u'\u00FF' ? u'\u0178' : c;
+}
+inline Text ToUpper(Text text)
+{
+    for (char16_t& c : text)
+        c = ToUpper(c);
+    return text;
+}
+
 // Whether two texts are equal but for the case of ASCII letters.
 constexpr bool EqualsIgnoringCase(TextView a, TextView b)
 {

@@ -21,7 +21,8 @@ Date TimestampFrom(TextView text)
     Text timePart;
     Text zonePart;
     SplitDateTime(text, datePart, timePart, zonePart);
-    return DateFrom(datePart + u" " + timePart.substr(0, 8));
+    const Text time = timePart.substr(0, 8);
+    return DateFrom(time.empty() ? datePart : datePart + u" " + time);
 }
 
 } // namespace
@@ -61,6 +62,12 @@ double XmlSection::NumberAt(Name path) const
     return node ? Converted(path, node.Text(), [](TextView text) { return NumberFrom(text); }) : 0;
 }
 
+std::int16_t XmlSection::Int16At(Name path) const
+{
+    const xml::Node node = Find(path);
+    return node ? Converted(path, node.Text(), [](TextView text) { return ToInt16(Text(text)); }) : std::int16_t{0};
+}
+
 std::int32_t XmlSection::Int32At(Name path) const
 {
     const xml::Node node = Find(path);
@@ -68,6 +75,24 @@ std::int32_t XmlSection::Int32At(Name path) const
 }
 
 Date XmlSection::RequiredTimestampAt(Name path) const { return Converted(path, RequiredTextAt(path), TimestampFrom); }
+
+Date XmlSection::TimestampAt(Name path) const { return Converted(path, TextAt(path), TimestampFrom); }
+
+Date XmlSection::TimestampAt(Name path, Date otherwise) const
+{
+    const Text text = TextAt(path);
+    return IsSet(text) ? Converted(path, text, TimestampFrom) : otherwise;
+}
+
+bool XmlSection::Has(Name path) const { return static_cast<bool>(Find(path)); }
+
+xml::NodeList XmlSection::NodesAt(Name path) const
+{
+    const std::size_t slash = path.find('/');
+    return element.IsElement(path.substr(0, slash)) ? element.Select(path.substr(slash + 1)) : xml::NodeList();
+}
+
+xml::Node XmlSection::FirstChildOf(Name path) const { return Find(path).FirstChild(); }
 
 xml::NodeList XmlSection::ElementsNamed(Name tagName) const
 {

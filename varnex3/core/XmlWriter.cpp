@@ -4,6 +4,7 @@
 #include <string>
 
 #include "varnex3/core/Conversions.h"
+#include "varnex3/core/Error.h"
 #include "varnex3/core/modFunctions.h"
 
 namespace varnex3 {
@@ -60,6 +61,25 @@ void XmlWriter::Close(Name group)
     EndLine();
 }
 
+void XmlWriter::OpenMessage(Name root)
+{
+    Line(u"<?xml version=\"1.0\" encoding=\"UTF-8\"?>");
+    StartLine();
+    Put(TextView(u"<"));
+    Put(root);
+    Put(TextView(u" xmlns:xsi=\"http://www.w3.org/2001/XMLSchema-instance\" xsi:noNamespaceSchemaLocation=\""));
+    Put(root);
+    Put(TextView(u".xsd\">"));
+    EndLine();
+    ++level;
+}
+
+void XmlWriter::CloseMessageWithoutLineEnd(Name root)
+{
+    --level;
+    PutEndTag(root);
+}
+
 XmlWriter::Mark XmlWriter::OpenUnlessEmpty(Name group)
 {
     const std::size_t before = length;
@@ -86,7 +106,14 @@ void XmlWriter::Always(Name element, TextView value)
 
 void XmlWriter::Always(Name element, Date value) { Always(element, TextView(FormatDate(value, 0))); }
 
-void XmlWriter::Always(Name element, double amount) { Always(element, TextView(FormatAmount(amount))); }
+void XmlWriter::Always(Name element, double amount)
+{
+    try {
+        Always(element, TextView(FormatAmount(amount)));
+    } catch (const Error& error) {
+        throw error.About(std::string(record) + ".Serialise", ToText(element));
+    }
+}
 
 void XmlWriter::Always(Name element, std::int32_t value) { Always(element, TextView(ToText(Variant(value)))); }
 
@@ -100,6 +127,30 @@ void XmlWriter::IfSet(Name element, Date value)
 {
     if (IsSet(value))
         Always(element, value);
+}
+
+void XmlWriter::IfPositive(Name element, double amount)
+{
+    if (amount > 0)
+        Always(element, amount);
+}
+
+void XmlWriter::Flag(Name element, bool isSet)
+{
+    if (!isSet)
+        return;
+    StartLine();
+    Put(TextView(u"<"));
+    Put(element);
+    Put(TextView(u"/>"));
+    EndLine();
+}
+
+void XmlWriter::Line(TextView text)
+{
+    StartLine();
+    Put(text);
+    EndLine();
 }
 
 void XmlWriter::AlwaysWithAttribute(Name element, Name attribute, TextView about, TextView value)

@@ -23,8 +23,8 @@ public:
     static Text TextOf(const T& record);
 
     // Whether a child would write anything at all.
-    template <class T>
-    static bool Writes(const Child<T>& child);
+    template <class T, Ref<T> (*Make)()>
+    static bool Writes(const Child<T, Make>& child);
 
     // A group's start tag and end tag; the lines between them stand one level deeper.
     void Open(Name group);
@@ -40,6 +40,11 @@ public:
     Mark OpenUnlessEmpty(Name group);
     void CloseUnlessEmpty(const Mark& mark);
 
+    // The frame of a message: XML declaration and root start tag, at level 0. Some messages end without a line end.
+    void OpenMessage(Name root);
+    void CloseMessage(Name root) { Close(root); }
+    void CloseMessageWithoutLineEnd(Name root);
+
     // A value line, whatever the value: <name>value</name>. Dates are written as yyyy-mm-dd, amounts as "0.00".
     void Always(Name element, TextView value);
     void Always(Name element, Date value);
@@ -50,15 +55,29 @@ public:
     void IfSet(Name element, TextView value);
     void IfSet(Name element, Date value);
 
+    // A value line, only for an amount greater than 0.
+    void IfPositive(Name element, double amount);
+
+    // An empty element, <name/>, when the flag is true.
+    void Flag(Name element, bool isSet);
+
     // A value line with an attribute, whatever the values: <name attribute="about">value</name>.
     void AlwaysWithAttribute(Name element, Name attribute, TextView about, TextView value);
 
+    // Anything else that is one line.
+    void Line(TextView text);
+
     // What a child record writes.
+    template <class T, Ref<T> (*Make)()>
+    void Append(const Child<T, Make>& child);
+
+    // What a record writes that stands in a list.
     template <class T>
-    void Append(const Child<T>& child);
+    void Append(const Ref<T>& item);
 
 private:
-    XmlWriter(std::span<char16_t> room_, int level_) : room(room_), level(level_) {}
+    // The record is the class whose Serialise raises what goes wrong here.
+    XmlWriter(std::span<char16_t> room_, int level_, Name record_) : room(room_), level(level_), record(record_) {}
 
     void StartLine();
     void EndLine() { Put(TextView(u"\r\n")); }
@@ -71,6 +90,7 @@ private:
     std::span<char16_t> room;
     std::size_t length = 0;
     int level;
+    Name record;
 };
 
 template <class T>
@@ -78,31 +98,39 @@ Text XmlWriter::TextOf(const T& record)
 {
     constexpr std::size_t kUsualRoom = 2048;
     std::array<char16_t, kUsualRoom> usual; // NOLINT(cppcoreguidelines-pro-type-member-init): filled by the writer
-    XmlWriter first(usual, T::kLevel);
+    XmlWriter first(usual, T::kLevel, T::ClassName);
     record.Write(first);
     if (first.length <= usual.size())
         return {usual.data(), first.length};
 
     Text text(first.length, u'\0');
-    XmlWriter second(text, T::kLevel);
+    XmlWriter second(text, T::kLevel, T::ClassName);
     record.Write(second);
     return text;
 }
 
-template <class T>
-bool XmlWriter::Writes(const Child<T>& child)
+template <class T, Ref<T> (*Make)()>
+bool XmlWriter::Writes(const Child<T, Make>& child)
 {
-    XmlWriter counter({}, T::kLevel);
+    XmlWriter counter({}, T::kLevel, T::ClassName);
     child->Write(counter);
     return counter.length > 0;
 }
 
-template <class T>
-void XmlWriter::Append(const Child<T>& child)
+template <class T, Ref<T> (*Make)()>
+void XmlWriter::Append(const Child<T, Make>& child)
 {
-    const int outer = std::exchange(level, T::kLevel);
-    child->Write(*this);
-    level = outer;
+    Append(child.Held());
+}
+
+template <class T>
+void XmlWriter::Append(const Ref<T>& item)
+{
+    const int outerLevel = std::exchange(level, T::kLevel);
+    const Name outerRecord = std::exchange(record, T::ClassName);
+    item->Write(*this);
+    level = outerLevel;
+    record = outerRecord;
 }
 
 } // namespace varnex3
