@@ -32,10 +32,15 @@ using CoreClasses = ClassList<
     // claim, vehicle and customer
     ClaimHeaderDef, VehicleDef, CustomerDef, PersonalNameDef>;
 
+using QuoteClasses = ClassList<
+    // items and their kinds
+    QuoteItemsDef, QuoteItem, QuoteHoursDef, QuoteItemPaintLabour, QuoteItemPaintMaterials, QuoteItemPart,
+    QuoteItemPartPartSource, QuoteItemMiscellaneous, QuoteItemMiscellaneousSublet, QuoteItemTowing, PartNumberDef>;
+
 using NoticesClasses = ClassList<VarnexReferenceDataEnum>;
 
 using InboxClasses = ClassList<MessageDef, Xalo_Messages>;
 
-using PublicClasses = JoinedLists<ModuleList, CoreClasses, NoticesClasses, InboxClasses>::List;
+using PublicClasses = JoinedLists<ModuleList, CoreClasses, QuoteClasses, NoticesClasses, InboxClasses>::List;
 
 } // namespace varnex3

@@ -1,0 +1,7 @@
+#include "varnex3/quote/PartNumberDef.h"
+
+namespace varnex3 {
+
+VARNEX_DEFINE(PartNumberDef);
+
+} // namespace varnex3
