@@ -59,15 +59,15 @@ MessageFile::MessageFile(const Error& error, const Text& name, const Text& path)
     message->FilePath(path);
 }
 
-MessageFile ReadMessageFile(InboxFolder& inbox, const InboxFolder::File& file)
+MessageFile ReadMessageFile(InboxFolder& inbox, const Text& name)
 {
-    const Text path = inbox.PathOf(file);
+    const Text path = inbox.PathOf(name);
     try {
         xml::Document document;
-        inbox.Load(file, document);
-        return {std::move(document), file.name, path};
+        inbox.Load(name, document);
+        return {std::move(document), name, path};
     } catch (const Error& error) {
-        return {error, file.name, path};
+        return {error, name, path};
     }
 }
 

@@ -28,7 +28,7 @@ struct MessageFile
 };
 
 // Reads a file of an inbox; one that cannot be read is an answer, too.
-MessageFile ReadMessageFile(InboxFolder& inbox, const InboxFolder::File& file);
+MessageFile ReadMessageFile(InboxFolder& inbox, const Text& name);
 
 // What the system said about a file, without the path that the library's description starts with.
 Text ReasonIn(const Error& error, const Text& path);

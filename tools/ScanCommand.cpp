@@ -15,13 +15,13 @@ namespace {
 template <class Action>
 Status ForEachFile(InboxFolder& inbox, Terminal* waiting, Action action)
 {
-    const auto files = inbox.MessageFiles();
+    const std::vector<Text> names = inbox.FileNames();
     std::optional<ProgressBar> progress;
     if (waiting)
-        progress.emplace(*waiting, files.size());
+        progress.emplace(*waiting, names.size());
     Status status = Status::Fine;
-    for (const InboxFolder::File& entry : files) {
-        const MessageFile file = ReadMessageFile(inbox, entry);
+    for (const Text& name : names) {
+        const MessageFile file = ReadMessageFile(inbox, name);
         if (!file.IsFine())
             status = Status::Findings;
         action(file);

@@ -3,13 +3,14 @@
 #include <random>
 
 #include "tests/Printing.h"
-#include "tests/inbox/Folders.h"
+#include "tests/TemporaryFolder.h"
 #include "varnex3/core/Json.h"
 #include "varnex3/inbox/Xalo_Messages.h"
 #include "varnex3/xml/Document.h"
 
 using namespace varnex3;
-using tests::Folder;
+using tests::NameOf;
+using tests::TemporaryFolder;
 
 namespace {
 
@@ -18,29 +19,29 @@ namespace fs = std::filesystem;
 Ref<MessageDef> InTwoStages(const fs::path& file)
 {
     xml::Document document;
-    document.LoadFile(ToUtf16(file.string()));
+    document.LoadFile(NameOf(file));
     const auto message = New<MessageDef>();
-    message->ParseXML(document.Xml(), ToUtf16(file.filename().string()), ToUtf16(file.string()));
+    message->ParseXML(document.Xml(), NameOf(file.filename()), NameOf(file));
     return message;
 }
 
 // What saveToFile writes; "no file" when it writes none.
-std::string Saved(MessageDef& message, const Folder& folder)
+std::string Saved(MessageDef& message, const TemporaryFolder& folder)
 {
     const fs::path file = folder.Path("saved");
     fs::remove(file);
-    message.saveToFile(ToUtf16(file.string()));
+    message.saveToFile(NameOf(file));
     return fs::exists(file) ? tests::BytesOf(file) : "no file";
 }
 
 // Scans a folder and compares each entry; the number of entries that were read and of those that were not.
 std::pair<int, int> CompareAll(const fs::path& inbox)
 {
-    const Folder target;
+    const TemporaryFolder target;
     const auto messages = New<Xalo_Messages>();
     std::int32_t number = 0;
     Text description;
-    CHECK(messages->ParseFiles(ToUtf16(inbox.string()), &number, &description));
+    CHECK(messages->ParseFiles(NameOf(inbox), &number, &description));
     CHECK(description == u"");
 
     std::pair<int, int> count;
@@ -51,7 +52,7 @@ std::pair<int, int> CompareAll(const fs::path& inbox)
         if (extension != ".xml" || !entry.is_regular_file())
             continue;
         CAPTURE(entry.path().string());
-        const Ref<MessageDef> scanned = messages->MessageItems(ToUtf16(entry.path().filename().string()));
+        const Ref<MessageDef> scanned = messages->MessageItems(NameOf(entry.path().filename()));
         const Ref<MessageDef> expected = InTwoStages(entry.path());
         REQUIRE(static_cast<bool>(scanned));
         CHECK(scanned->SourceXML() == expected->SourceXML());
@@ -106,7 +107,7 @@ TEST_CASE("Every damaged sample is summarised as in two stages")
     std::ranges::sort(samples);
 
     std::mt19937 random(5);
-    const Folder inbox;
+    const TemporaryFolder inbox;
     constexpr int kDamages = 8; // of each sample
     for (int i = 0; i < kDamages; ++i)
         for (const std::string& sample : samples)
@@ -118,7 +119,7 @@ TEST_CASE("Every damaged sample is summarised as in two stages")
 
 TEST_CASE("Declarations, encodings and layouts are summarised as in two stages")
 {
-    const Folder inbox;
+    const TemporaryFolder inbox;
     const char* const declarations[] = {"", "<?xml version='1.0'?>", "<?xml version=\"1.0\" encoding=\"utf-8\"?>\r\n",
                                         "<?xml version='1.0' standalone='yes'?>\n",
                                         "<?xml version='1.0' encoding='ISO-8859-1' standalone='no'?>"};

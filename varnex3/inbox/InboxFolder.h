@@ -6,6 +6,7 @@
 
 #include "varnex3/core/Text.h"
 #include "varnex3/xml/Document.h"
+#include "varnex3/xml/Folder.h"
 
 namespace varnex3 {
 
@@ -13,32 +14,24 @@ namespace varnex3 {
 class InboxFolder
 {
 public:
-    struct File
-    {
-        Text name;
-        std::string nativeName; // as the system has it
-    };
-
     // Raises FolderMissing when there is no such folder, another error when it cannot be read.
     explicit InboxFolder(const Text& path);
-    ~InboxFolder();
-    InboxFolder(const InboxFolder&) = delete;
-    InboxFolder& operator=(const InboxFolder&) = delete;
 
-    // The files directly in the folder whose extension is xml, in any letter case, in the order of their names by
+    // The names of the files directly in the folder whose extension is xml, in any letter case, in their order by
     // 16-bit units. Folders and other things that are no files are passed over.
-    std::vector<File> MessageFiles() const;
+    std::vector<Text> FileNames() const;
 
     // Loads a file; false when it is not well-formed. Raises FileNotFound, PermissionDenied or DeviceInputOutput when
     // it cannot be read.
-    bool Load(const File& file, xml::Document& document);
+    bool Load(const Text& name, xml::Document& document);
 
     // The folder's path as given, a separator where needed, and the name.
-    Text PathOf(const File& file) const;
+    Text PathOf(const Text& name) const { return folder.PathOf(name); }
 
 private:
-    Text path;
-    int folder = -1;
+    std::size_t Read(const Text& name);
+
+    xml::Folder folder;
     std::string bytes; // of the file read last: its room is used again
 };
 

@@ -24,10 +24,10 @@ bool Xalo_Messages::ParseFiles(const Text& sFolderPath, std::int32_t* ErrorNo, T
 void Xalo_Messages::AddFiles(const Text& folder)
 {
     InboxFolder inbox(folder);
-    for (const InboxFolder::File& file : inbox.MessageFiles()) {
+    for (const Text& name : inbox.FileNames()) {
         xml::Document document;
-        inbox.Load(file, document);
-        Add(file.name)->AdoptFile(std::move(document), file.name, inbox.PathOf(file)); // every file gets an entry
+        inbox.Load(name, document);
+        Add(name)->AdoptFile(std::move(document), name, inbox.PathOf(name)); // every file gets an entry
     }
 }
 

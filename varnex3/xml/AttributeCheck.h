@@ -208,7 +208,7 @@ bool AttributeCheck<Char>::AreDifferentByHash(std::size_t first)
     places.Fill(size, free);
 
     for (std::size_t i = 0; i < names.Size(); ++i) {
-        std::size_t place = HashOf(names[i].local, HashSeed() + names[i].uri) & (size - 1);
+        std::size_t place = PlaceOf(HashOf(names[i].local, HashSeed() + names[i].uri), size);
         for (; places[place] != free; place = (place + 1) & (size - 1))
             if (names[places[place]] == names[i])
                 return FailDuplicate(first + i);

@@ -3,6 +3,7 @@
 #pragma once
 
 #include <algorithm>
+#include <cstddef>
 #include <cstdint>
 #include <string_view>
 
@@ -19,6 +20,13 @@ std::uint64_t HashOf(std::basic_string_view<Char> name, std::uint64_t seed)
     for (const Char c : name)
         hash = (hash ^ Unit(c)) * 0x100000001B3u;
     return hash ^ hash >> 29;
+}
+
+// Where a hash is in a table of so many places, a power of two. The lowest bits depend on the whole hash: it does not
+// matter that a 32-bit system has no table that needs more of them.
+inline std::size_t PlaceOf(std::uint64_t hash, std::size_t places)
+{
+    return static_cast<std::size_t>(hash) & (places - 1);
 }
 
 inline std::uint64_t HashSeed()
@@ -93,7 +101,7 @@ private:
         return at;
     }
 
-    std::size_t BucketNumber(View prefix) const { return HashOf(prefix, HashSeed()) & (buckets.Size() - 1); }
+    std::size_t BucketNumber(View prefix) const { return PlaceOf(HashOf(prefix, HashSeed()), buckets.Size()); }
     std::uint32_t& Bucket(View prefix) { return buckets[BucketNumber(prefix)]; }
 
     void Link(std::size_t index)
