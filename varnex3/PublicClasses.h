@@ -11,6 +11,11 @@ template <class... Class>
 struct ClassList
 {};
 
+// The lists of several folders.
+template <class... List>
+struct Folders
+{};
+
 template <class... Lists>
 struct JoinedLists;
 template <class... A>
@@ -20,6 +25,9 @@ struct JoinedLists<ClassList<A...>>
 };
 template <class... A, class... B, class... Rest>
 struct JoinedLists<ClassList<A...>, ClassList<B...>, Rest...> : JoinedLists<ClassList<A..., B...>, Rest...>
+{};
+template <class First, class... List>
+struct JoinedLists<First, Folders<List...>> : JoinedLists<First, List...>
 {};
 
 using ModuleList = ClassList<modGeneral, modFunctions>;
@@ -41,6 +49,8 @@ using NoticesClasses = ClassList<VarnexReferenceDataEnum>;
 
 using InboxClasses = ClassList<MessageDef, Xalo_Messages>;
 
-using PublicClasses = JoinedLists<ModuleList, CoreClasses, QuoteClasses, NoticesClasses, InboxClasses>::List;
+using ClassFolders = Folders<CoreClasses, QuoteClasses, NoticesClasses, InboxClasses>;
+
+using PublicClasses = JoinedLists<ModuleList, ClassFolders>::List;
 
 } // namespace varnex3

@@ -2,7 +2,6 @@
 #include "varnex3_c.h"
 
 #include <cstring>
-#include <mutex>
 #include <set>
 #include <string>
 #include <vector>
@@ -57,14 +56,49 @@ void RequireHandle(const void* given, Name operation, Name what)
 
 // --- Names --------------------------------------------------------------------------------
 
-// A name that ends with a NUL and is never freed.
+using Names = std::set<std::string, std::less<>>;
+
+void Collect(Names& names, const ClassInfo& info)
+{
+    names.emplace(info.name);
+    names.emplace(info.doc);
+    for (const Member& member : info.members) {
+        names.emplace(member.name);
+        names.emplace(member.doc);
+        names.emplace(member.type.name);
+        for (const Parameter& parameter : member.Parameters()) {
+            names.emplace(parameter.name);
+            names.emplace(parameter.type.name);
+            names.emplace(parameter.initial);
+        }
+    }
+}
+
+void Collect(Names& names, const EnumInfo& info)
+{
+    names.emplace(info.name);
+    names.emplace(info.doc);
+    for (const Enumerator& constant : info.values) {
+        names.emplace(constant.name);
+        names.emplace(constant.doc);
+    }
+}
+
+Names CollectNames()
+{
+    Names names;
+    for (const ClassInfo* const info : Classes())
+        Collect(names, *info);
+    for (const EnumInfo* const info : Enumerations())
+        Collect(names, *info);
+    return names;
+}
+
+// A name or a doc of the tables, ended with a NUL and never freed.
 const char* Lasting(Name name)
 {
-    static std::mutex mutex;
-    static std::set<std::string, std::less<>> names;
-    const std::scoped_lock lock(mutex);
-    const auto found = names.find(name);
-    return (found != names.end() ? found : names.emplace(name).first)->c_str();
+    static const Names names = CollectNames();
+    return names.find(name)->c_str();
 }
 
 Name Given(const char* name) { return name ? Name(name) : Name(); }

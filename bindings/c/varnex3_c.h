@@ -25,8 +25,10 @@
 extern "C" {
 #endif
 
-#if defined(_WIN32)
-#define VARNEX3_API
+#if defined(_WIN32) && defined(VARNEX3_EXPORTS) /* when Varnex3.dll itself is compiled */
+#define VARNEX3_API __declspec(dllexport)
+#elif defined(_WIN32)
+#define VARNEX3_API __declspec(dllimport)
 #else
 #define VARNEX3_API __attribute__((visibility("default")))
 #endif

@@ -5,11 +5,22 @@
 #include <concepts>
 #include <cstddef>
 #include <cstdint>
+#include <memory>
 #include <utility>
 
 namespace varnex3 {
 
 struct ClassInfo;
+
+// A face's own part of a record, such as the interface pointers that automation hosts hold.
+class Attachment
+{
+public:
+    Attachment() = default;
+    Attachment(const Attachment&) = delete;
+    Attachment& operator=(const Attachment&) = delete;
+    virtual ~Attachment() = default;
+};
 
 // The base of every class. Records are made by New<T>(), live as long as somebody holds a Ref to them, and are used
 // by one thread at a time; the count alone is safe to change from several.
@@ -25,12 +36,18 @@ public:
     // The level at which a record writes its group when nothing else is said: directly under a message's root.
     static constexpr int kLevel = 1;
 
-    void AddRef() const noexcept { references.fetch_add(1, std::memory_order_relaxed); }
-    void Release() const noexcept
+    // Both give the new count.
+    std::int32_t AddRef() const noexcept { return references.fetch_add(1, std::memory_order_relaxed) + 1; }
+    std::int32_t Release() const noexcept
     {
-        if (references.fetch_sub(1, std::memory_order_acq_rel) == 1)
+        const std::int32_t left = references.fetch_sub(1, std::memory_order_acq_rel) - 1;
+        if (left == 0)
             delete this;
+        return left;
     }
+
+    // Null until a face needs it; ends with the record.
+    std::unique_ptr<Attachment>& Attached() noexcept { return attachment; }
 
 protected:
     Record() = default;
@@ -38,6 +55,7 @@ protected:
 
 private:
     mutable std::atomic<std::int32_t> references{0};
+    std::unique_ptr<Attachment> attachment;
 };
 
 // A counted reference to a record; may be null.

@@ -1,0 +1,41 @@
+// What the system and regsvr32 call.
+#include <windows.h>
+
+#include "varnex3/server/ClassFactory.h"
+#include "varnex3/server/Module.h"
+#include "varnex3/server/Registration.h"
+#include "varnex3/server/TypeLibrary.h"
+
+using namespace varnex3::server;
+
+STDAPI DllGetClassObject(REFCLSID classId, REFIID iid, LPVOID* result)
+{
+    if (!result)
+        return E_POINTER;
+    *result = nullptr;
+    try {
+        const Coclass* const coclass = FindCoclass(classId);
+        return coclass ? FindFactory(*coclass, iid, result) : CLASS_E_CLASSNOTAVAILABLE;
+    } catch (...) {
+        return E_OUTOFMEMORY;
+    }
+}
+
+STDAPI DllCanUnloadNow()
+{
+    if (Module::IsUsed())
+        return S_FALSE;
+    ReleaseTypeLibrary();
+    return S_OK;
+}
+
+STDAPI DllRegisterServer() { return Register(Scope::Machine); }
+STDAPI DllUnregisterServer() { return Unregister(Scope::Machine); }
+
+// regsvr32 /n /i:user registers for the user alone, which takes no administrator.
+STDAPI DllInstall(BOOL isInstalled, LPCWSTR words)
+{
+    if (!words || lstrcmpiW(words, L"user") != 0)
+        return E_INVALIDARG;
+    return isInstalled ? Register(Scope::User) : Unregister(Scope::User);
+}
