@@ -119,10 +119,6 @@ class Layers(unittest.TestCase):
 
 
 class Documents(unittest.TestCase):
-    def test_the_interface_is_the_one_that_hosts_are_bound_to(self) -> None:
-        printed = run(sys.executable, "-B", SOURCE / "scripts/interface")
-        self.assertEqual(printed.splitlines(), (SOURCE / "docs/interface.txt").read_text().splitlines())
-
     def test_the_examples_of_the_readme_print_what_it_shows(self) -> None:
         text = (SOURCE / "README.md").read_text(encoding="utf-8")
         pairs = re.findall(r"```python\n(.*?)```\n+(?:prints|which prints):?\n+```xml\n(.*?)```", text, re.DOTALL)

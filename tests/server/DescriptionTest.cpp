@@ -157,6 +157,17 @@ TEST_CASE("IDL: what is passed by reference is a pointer, changed or not")
     CHECK(Has(ToIdl(Described({&toy.info})), "HRESULT Find([in, out] BSTR* sKey);\n"));
 }
 
+TEST_CASE("IDL for the header: a class is its identifier; one that is called as a constant is still told from it")
+{
+    const std::string idl = ToHeaderIdl(Describe());
+    CHECK_FALSE(Has(idl, "coclass"));
+    CHECK(Has(idl,
+              "cpp_quote(\"DEFINE_GUID(CLSID_VersionDef, 0x6CD4640B, 0xE818, 0x5F00, 0xAA, 0xFD, 0x60, 0xAF, 0xBD, "
+              "0xC6, 0xEB, 0xB8);\")"));
+    CHECK(Has(idl, "cpp_quote(\"__CRT_UUID_DECL(class VersionDef, 0x6CD4640B, "));
+    CHECK(Has(idl, "cpp_quote(\"class DECLSPEC_UUID(\\\"6CD4640B-E818-5F00-AAFD-60AFBDC6EBB8\\\") VersionDef;\")"));
+}
+
 TEST_CASE("IDL: the predeclared class is the application object, and no other")
 {
     const std::string idl = ToIdl(Describe());

@@ -122,6 +122,33 @@ std::string CoClassOf(const Class& described)
            + described.interfaceName + ";\n    };\n\n";
 }
 
+// The bytes of an identifier as C has them in braces or as arguments: "0x6CD4640B, 0xE818, 0x5F00, 0xAA, ...".
+std::string BytesOf(const std::string& guid)
+{
+    std::string text = "0x" + guid.substr(0, 8) + ", 0x" + guid.substr(9, 4) + ", 0x" + guid.substr(14, 4);
+    const std::string last = guid.substr(19, 4) + guid.substr(24);
+    for (std::size_t i = 0; i < last.size(); i += 2)
+        text += ", 0x" + last.substr(i, 2);
+    return text;
+}
+
+// What a header has for a class: CLSID_VersionDef and, in C++, __uuidof(VersionDef).
+std::string ClassInHeader(const Class& described)
+{
+    const std::string bytes = BytesOf(described.guid);
+    const std::string lines[] = {"DEFINE_GUID(CLSID_" + described.name + ", " + bytes + ");",
+                                 "#ifdef __cplusplus",
+                                 "class DECLSPEC_UUID(\"" + described.guid + "\") " + described.name + ";",
+                                 "#ifdef __CRT_UUID_DECL",
+                                 "__CRT_UUID_DECL(class " + described.name + ", " + bytes + ")",
+                                 "#endif",
+                                 "#endif"};
+    std::string text;
+    for (const std::string& line : lines)
+        text += "    cpp_quote(" + Quoted(line) + ")\n";
+    return text + "\n";
+}
+
 std::string HeadOf(const Library& library)
 {
     return "// Made from the rows of the classes by varnex3_idl: change those, not this.\nimport "
@@ -131,9 +158,8 @@ std::string HeadOf(const Library& library)
            + "\n{\n    importlib(\"stdole2.tlb\");\n\n";
 }
 
-} // namespace
-
-std::string ToIdl(const Library& library)
+// Everything, with the classes as the function given writes them.
+std::string ToIdl(const Library& library, std::string (*classToIdl)(const Class&))
 {
     std::string text = HeadOf(library);
     for (const Enumeration& enumeration : library.enumerations)
@@ -144,9 +170,15 @@ std::string ToIdl(const Library& library)
     for (const Class& described : library.classes)
         text += InterfaceOf(described);
     for (const Class& described : library.classes)
-        text += CoClassOf(described);
+        text += classToIdl(described);
     text.pop_back();
     return text + "};\n";
 }
+
+} // namespace
+
+std::string ToIdl(const Library& library) { return ToIdl(library, &CoClassOf); }
+
+std::string ToHeaderIdl(const Library& library) { return ToIdl(library, &ClassInHeader); }
 
 } // namespace varnex3::server::idl

@@ -83,11 +83,8 @@ std::string ToListing(const Library& library)
 std::string ToHelpStrings(const Library& library)
 {
     std::string text = library.name + ": " + library.doc + "\n";
-    for (const Enumeration& enumeration : library.enumerations) {
+    for (const Enumeration& enumeration : library.enumerations)
         text += enumeration.name + ": " + enumeration.doc + "\n";
-        for (const Constant& constant : enumeration.constants)
-            text += enumeration.name + "." + constant.name + ": " + constant.doc + "\n";
-    }
     for (const Class& described : library.classes) {
         text += described.name + ": " + described.doc + "\n" + described.interfaceName + ": " + described.interfaceDoc
                 + "\n";

@@ -1,6 +1,7 @@
 // Tells what hosts of the component are bound to, from the rows of the classes.
 //
 //     varnex3_idl --idl            the IDL, from which the type library is made
+//     varnex3_idl --header-idl     the IDL, from which the header for C and C++ is made
 //     varnex3_idl --listing        every identifier, slot and constant, a line each; then the modules' functions
 //     varnex3_idl --help-strings   every help string, a line each
 //     varnex3_idl --manifest win32|win64
@@ -41,6 +42,8 @@ std::string Answer(std::string_view option, std::string_view argument)
     const idl::Library library = idl::Describe();
     if (option == "--idl")
         return idl::ToIdl(library);
+    if (option == "--header-idl")
+        return idl::ToHeaderIdl(library);
     if (option == "--listing")
         return idl::ToListing(library) + ModulesOf(Classes());
     if (option == "--help-strings")
@@ -49,7 +52,8 @@ std::string Answer(std::string_view option, std::string_view argument)
         return idl::ToManifest(library, "x86", VARNEX3_VERSION ".0");
     if (option == "--manifest" && argument == "win64")
         return idl::ToManifest(library, "amd64", VARNEX3_VERSION ".0");
-    throw std::runtime_error("one of --idl, --listing, --help-strings, --manifest win32, --manifest win64 is required");
+    throw std::runtime_error(
+        "one of --idl, --header-idl, --listing, --help-strings, --manifest win32|win64 is required");
 }
 
 } // namespace
