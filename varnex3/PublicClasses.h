@@ -40,6 +40,9 @@ using CoreClasses = ClassList<
     // claim, vehicle and customer
     ClaimHeaderDef, VehicleDef, CustomerDef, PersonalNameDef>;
 
+using RequestClasses =
+    ClassList<Xalo_RequestForQuote, RequestDetailsDef, DamagedAreasDef, ClaimantTypeDef, VehicleModsDef>;
+
 using QuoteClasses = ClassList<
     // items and their kinds
     QuoteItemsDef, QuoteItem, QuoteHoursDef, QuoteItemPaintLabour, QuoteItemPaintMaterials, QuoteItemPart,
@@ -49,7 +52,7 @@ using NoticesClasses = ClassList<VarnexReferenceDataEnum>;
 
 using InboxClasses = ClassList<MessageDef, Xalo_Messages>;
 
-using ClassFolders = Folders<CoreClasses, QuoteClasses, NoticesClasses, InboxClasses>;
+using ClassFolders = Folders<CoreClasses, RequestClasses, QuoteClasses, NoticesClasses, InboxClasses>;
 
 using PublicClasses = JoinedLists<ModuleList, ClassFolders>::List;
 

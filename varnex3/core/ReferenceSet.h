@@ -2,6 +2,7 @@
 #pragma once
 
 #include <memory>
+#include <optional>
 
 #include "varnex3/core/RowSet.h"
 
@@ -14,5 +15,9 @@ namespace varnex3 {
 // Each program has one definition of it: that of modDBAccess, or the one of NoDatabase.cpp for a program without
 // databases.
 std::shared_ptr<RowSet> GetReferenceSet(TextView first, TextView second);
+
+// The description of a code, found as RowSet::Find does: the first row counts, upper and lower case are alike. Nothing
+// when there is none, and in a set that was never opened. A code with an apostrophe raises kMalformedCriterion.
+std::optional<Text> FindDescription(RowSet& set, TextView code);
 
 } // namespace varnex3

@@ -392,6 +392,16 @@ public:                                                                         
     }                                                                                                                  \
     VARNEX_ROW_(::varnex3::rows::Method<Self, &Self::ParseXML>("ParseXML", "(const Text& sXML)", doc))
 
+// ParseXML of a whole message. Its result is the message written again from what was read.
+#define VARNEX_PARSEXML_OF_MESSAGE(Type_, doc)                                                                         \
+    void Read(const ::varnex3::XmlSection& section);                                                                   \
+    Type_ ParseXML(const ::varnex3::Text& sXML)                                                                        \
+    {                                                                                                                  \
+        ::varnex3::XmlSection::ReadText(*this, sXML);                                                                  \
+        return Serialise();                                                                                            \
+    }                                                                                                                  \
+    VARNEX_ROW_(::varnex3::rows::Method<Self, &Self::ParseXML>("ParseXML", "(const Text& sXML)", doc))
+
 // A module: functions that need no object. Its rows stand between VARNEX_MODULE and VARNEX_MODULE_END, at namespace
 // scope; each declares a function of the namespace varnex3.
 #define VARNEX_MODULE(Name_, doc)                                                                                      \
