@@ -44,6 +44,11 @@ using RequestClasses =
     ClassList<Xalo_RequestForQuote, RequestDetailsDef, DamagedAreasDef, ClaimantTypeDef, VehicleModsDef>;
 
 using QuoteClasses = ClassList<
+    // the message, its status and inspection
+    Xalo_Quote, VarnexStatusDef, InspectionDef,
+    // header
+    QuoteDetailsDef, OwnersContributionToCollectDef, VehicleDetailsDef, VehicleDetailsDefOdometer, HourlyRatesDef,
+    TotalsDef, AssessmentDef,
     // items and their kinds
     QuoteItemsDef, QuoteItem, QuoteHoursDef, QuoteItemPaintLabour, QuoteItemPaintMaterials, QuoteItemPart,
     QuoteItemPartPartSource, QuoteItemMiscellaneous, QuoteItemMiscellaneousSublet, QuoteItemTowing, PartNumberDef>;
