@@ -1,9 +1,7 @@
 #include "varnex3/core/Record.h"
 
-#include <thread>
-#include <vector>
-
 #include "tests/Printing.h"
+#include "tests/Threads.h"
 #include "varnex3/core/CustomerDef.h"
 #include "varnex3/core/Rows.h"
 
@@ -37,6 +35,22 @@ class Branch final : public Record
     VARNEX_RECORD_END;
 };
 
+Ref<Leaf> NewNamedLeaf()
+{
+    const auto leaf = New<Leaf>();
+    leaf->Name(u"made");
+    return leaf;
+}
+
+class Twig final : public Record
+{
+    using NamedLeaf = Child<Leaf, &NewNamedLeaf>;
+    VARNEX_RECORD(Twig, "A record whose child starts with a name.");
+    VARNEX_PROPERTY(NamedLeaf, objFirst, First, "The child.");
+    VARNEX_RECORD_END;
+};
+
+VARNEX_DEFINE(Twig);
 VARNEX_DEFINE(Leaf);
 VARNEX_DEFINE(Branch);
 
@@ -82,14 +96,10 @@ TEST_CASE("Ref: assigning itself changes nothing")
 TEST_CASE("Ref: references may come and go on several threads")
 {
     const auto leaf = New<Leaf>();
-    std::vector<std::thread> threads;
-    for (int i = 0; i < 4; ++i)
-        threads.emplace_back([&leaf] {
-            for (int j = 0; j < 20000; ++j)
-                const auto copy = leaf; // NOLINT(performance-unnecessary-copy-initialization): the copy is the test
-        });
-    for (std::thread& thread : threads)
-        thread.join();
+    tests::OnThreads(4, [&leaf] {
+        for (int i = 0; i < 20000; ++i)
+            const auto copy = leaf; // NOLINT(performance-unnecessary-copy-initialization): the copy is the test
+    });
     CHECK(living == 1);
 }
 
@@ -135,6 +145,18 @@ TEST_CASE("Child: set to nothing it is released, and made again with its default
     CHECK(living == 0);
     CHECK(branch->First()->Name() == u"");
     CHECK(living == 1);
+}
+
+TEST_CASE("Child: one that starts with values of its own has them until it is set to nothing")
+{
+    const auto twig = New<Twig>();
+    CHECK(living == 0);
+    CHECK(twig->First()->Name() == u"made");
+    twig->First(nullptr);
+    CHECK(twig->First()->Name() == u"");
+    const auto other = New<Twig>();
+    other->First(nullptr); // before its first use
+    CHECK(other->First()->Name() == u"");
 }
 
 TEST_CASE("Child: a holder that is not changed makes its child, too")

@@ -137,3 +137,38 @@ TEST_CASE("A section that a child reads in place reads as its own text loaded ag
         CHECK(name->HomePhone() == again->HomePhone());
     }
 }
+
+TEST_CASE("Int16At: a number of 16 bits; absent gives 0")
+{
+    const TextSection section(u"<A><B>-32768</B><C>32768</C><D/></A>");
+    CHECK(section->Int16At("A/B") == -32768);
+    CHECK(section->Int16At("A/X") == 0);
+    CHECK(RaisedBy([&] { section->Int16At("A/C"); }) == "6 ReaderDef.ParseXML");
+    CHECK(RaisedBy([&] { section->Int16At("A/D"); }) == "13 ReaderDef.ParseXML");
+}
+
+TEST_CASE("Has, NodesAt and FirstChildOf: what is there, whatever it holds")
+{
+    const TextSection section(u"<A><B/><C>x</C><B><!--c--><D/></B></A>");
+    CHECK(section->Has("A/B"));
+    CHECK_FALSE(section->Has("A/D"));
+    CHECK_FALSE(section->Has("B"));
+    CHECK(section->NodesAt("A/B").size() == 2);
+    CHECK(section->NodesAt("X/B").empty());
+    CHECK(section->FirstChildOf("A/C").Text() == u"x");
+    CHECK_FALSE(static_cast<bool>(section->FirstChildOf("A/B")));
+    CHECK(section->FirstChildOf("A").Name() == u"B");
+}
+
+TEST_CASE("ReadIntoWhereUsed: a child reads its section, and an absent one only when it was made")
+{
+    const TextSection section(u"<A><PersonalName><Surname>S</Surname></PersonalName></A>");
+    Child<PersonalNameDef> used;
+    CHECK(section->ReadIntoWhereUsed(used, "A/PersonalName"));
+    CHECK(used->Surname() == u"S");
+    CHECK_FALSE(section->ReadIntoWhereUsed(used, "A/Other"));
+    CHECK(used->Surname() == u"");
+    Child<PersonalNameDef> unused;
+    CHECK_FALSE(section->ReadIntoWhereUsed(unused, "A/Other"));
+    CHECK_FALSE(unused.IsMade());
+}

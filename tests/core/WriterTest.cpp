@@ -74,6 +74,32 @@ TEST_CASE("XmlWriter: an amount or a date that cannot be written raises")
     CHECK(RaisedBy([] { TextOf([](XmlWriter& xml) { xml.Always("A", Date{1e9}); }); }).starts_with("6"));
 }
 
+TEST_CASE("XmlWriter: an amount that cannot be written is raised by the record that writes it, about its element")
+{
+    try {
+        TextOf([](XmlWriter& xml) { xml.Always("Cost", 1e308 * 10); });
+        FAIL("nothing was raised");
+    } catch (const Error& error) {
+        CHECK(error.Source() == u"Written.Serialise");
+        CHECK(error.Description() == u"Cost: an amount that is not a finite number");
+    }
+}
+
+TEST_CASE("XmlWriter: IfPositive leaves out what is not greater than 0")
+{
+    const auto written = [](double amount) { return TextOf([&](XmlWriter& xml) { xml.IfPositive("A", amount); }); };
+    CHECK(written(0) == u"");
+    CHECK(written(-1) == u"");
+    CHECK(written(0.001) == u"\t<A>0.00</A>\r\n");
+    CHECK(written(2) == u"\t<A>2.00</A>\r\n");
+}
+
+TEST_CASE("XmlWriter: a flag is an empty element, or nothing")
+{
+    CHECK(TextOf([](XmlWriter& xml) { xml.Flag("A", true); }) == u"\t<A/>\r\n");
+    CHECK(TextOf([](XmlWriter& xml) { xml.Flag("A", false); }) == u"");
+}
+
 TEST_CASE("XmlWriter: IfSet leaves out the empty text and the zero date, and nothing else")
 {
     CHECK(TextOf([](XmlWriter& xml) { xml.IfSet("A", u""); }) == u"");
