@@ -42,7 +42,8 @@ def subject_of(line: str) -> str:
 def differences(expected: str, found: str) -> list[str]:
     """A line for each fact that is gone, new or another one; empty when the listings say the same in the same order."""
     before, after = facts(expected), facts(found)
-    told = [f"{key}\n    was {before[key]}\n    is  {after[key]}" for key in before if before[key] != after.get(key, before[key])]
+    changed = [key for key in before if before[key] != after.get(key, before[key])]
+    told = [f"{key}\n    was {before[key]}\n    is  {after[key]}" for key in changed]
     told += [f"{key} is gone: {before[key]}" for key in before if key not in after]
     told += [f"{key} is new: {after[key]}" for key in after if key not in before]
     if not told:

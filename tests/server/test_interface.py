@@ -94,9 +94,8 @@ class Differences(unittest.TestCase):
         self.assertEqual(self.told(" 5  Five", " 6  Five"), "KindEnum: Five\n    was 5 Five\n    is  6 Five")
 
     def test_what_is_gone_and_what_is_new_is_named(self) -> None:
-        self.assertEqual(
-            self.told("First: text", "Next: text"), "ADef: get First is gone: 7 1 get First: text\nADef: get Next is new: 7 1 get Next: text"
-        )
+        told = "ADef: get First is gone: 7 1 get First: text\nADef: get Next is new: 7 1 get Next: text"
+        self.assertEqual(self.told("First: text", "Next: text"), told)
         self.assertEqual(
             self.told("    varnex3_call\n", ""), "functions of the C library: varnex3_call is gone: varnex3_call"
         )
