@@ -4,11 +4,16 @@ namespace varnex3 {
 
 VARNEX_DEFINE(VersionDef);
 
+LibraryVersion& RunningVersion()
+{
+    static LibraryVersion version{VARNEX3_VERSION_MAJOR, VARNEX3_VERSION_MINOR};
+    return version;
+}
+
 Text VersionDef::DLLVersion() const
 {
-    constexpr std::int16_t major = VARNEX3_VERSION_MAJOR;
-    constexpr std::int16_t minor = VARNEX3_VERSION_MINOR;
-    return ToText(Variant(major)) + u"." + ToText(Variant(minor));
+    const LibraryVersion version = RunningVersion();
+    return ToText(Variant(version.major)) + u"." + ToText(Variant(version.minor));
 }
 
 void VersionDef::Write(XmlWriter& xml) const

@@ -5,6 +5,14 @@
 
 namespace varnex3 {
 
+// The version that DLLVersion tells: the one compiled in, unless the component finds another in its own file.
+struct LibraryVersion
+{
+    std::int16_t major;
+    std::int16_t minor;
+};
+LibraryVersion& RunningVersion();
+
 class VersionDef final : public Record
 {
     VARNEX_RECORD(VersionDef, "The version of the message language that a message is written in.");

@@ -6,7 +6,16 @@
 #include "varnex3/server/Registration.h"
 #include "varnex3/server/TypeLibrary.h"
 
+using namespace varnex3;
 using namespace varnex3::server;
+
+BOOL WINAPI DllMain(HINSTANCE, DWORD reason, LPVOID)
+{
+    const bool isLoaded = reason == DLL_PROCESS_ATTACH;
+    if (const auto version = isLoaded ? Module::Version() : std::nullopt)
+        RunningVersion() = *version;
+    return TRUE;
+}
 
 STDAPI DllGetClassObject(REFCLSID classId, REFIID iid, LPVOID* result)
 {

@@ -1,8 +1,11 @@
 // The component as a loaded module: where it is, which version it is, and whether somebody still uses it.
 #pragma once
 
+#include <optional>
 #include <string>
 #include <windows.h>
+
+#include "varnex3/core/VersionDef.h"
 
 namespace varnex3::server {
 
@@ -10,6 +13,9 @@ class Module
 {
 public:
     static HINSTANCE Handle();
+
+    // The numbers of the version resource; nothing when there is none.
+    static std::optional<LibraryVersion> Version() noexcept;
 
     // The full path of the component's file, of whatever length.
     static std::wstring Path();
