@@ -18,6 +18,7 @@ using namespace std::chrono_literals;
 constexpr auto kCommandTimeout = 120s;
 constexpr auto kSlow = 250ms;
 constexpr auto kPause = 30s;
+constexpr auto kPauseOfReferenceSets = 1s;
 constexpr Name kExecSP = "modDBAccess.DBExecSP";
 constexpr TextView kDefaultDescription = u"Application-defined or object-defined error"; // the platform's for 30010
 
@@ -34,6 +35,7 @@ struct ModuleState
     std::shared_ptr<DatabaseConnection> secondReference; // what the last check found open; nothing reads it
     std::optional<ConnectFailure> failure;
     std::optional<SlowFailure> slowFailure;
+    std::optional<Clock::time_point> setWithoutDatabase; // when a reference set found none, unless others tried since
 
     ModuleState() = default;
     ModuleState(const ModuleState&) = delete;
@@ -60,6 +62,13 @@ bool IsPausing(const Text& connectionString)
 {
     const std::optional<SlowFailure>& slow = State().slowFailure;
     return slow && slow->connectionString == connectionString && Clock::now() - slow->time < kPause;
+}
+
+// Records ask for a set each time one is made: a quote would take longer to ask in vain than to be read.
+bool SetsArePausing()
+{
+    const std::optional<Clock::time_point>& since = State().setWithoutDatabase;
+    return since && Clock::now() - *since < kPauseOfReferenceSets;
 }
 
 void RememberFailure(const Text& reason, const ConnectionSettings& settings, Clock::time_point start)
@@ -143,6 +152,7 @@ std::shared_ptr<RowSet> Execute(TextView sProcName, TextView sParams, std::int32
 bool DBConnect()
 {
     State().connection.reset();
+    State().setWithoutDatabase.reset();
     const ConnectionSettings settings = ReadConnectionSettings();
     if (!IsPausing(ComposeConnectionString(settings)))
         Open(settings);
@@ -177,9 +187,14 @@ std::shared_ptr<RowSet> DBExecSP(TextView sProcName, TextView sParams, std::int3
 
 std::shared_ptr<RowSet> GetReferenceSet(TextView first, TextView second)
 {
+    if (SetsArePausing())
+        return std::make_shared<RowSet>();
     std::int32_t lID = 0;
     auto rowSet = DBExecSP(u"getVarnexReferenceSet", Text(first) + u"\t" + Text(second), lID, false, false);
-    return rowSet ? rowSet : std::make_shared<RowSet>();
+    if (rowSet)
+        return rowSet;
+    State().setWithoutDatabase = Clock::now();
+    return std::make_shared<RowSet>();
 }
 
 std::optional<ConnectFailure> LastConnectFailure() { return State().failure; }

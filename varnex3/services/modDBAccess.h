@@ -6,6 +6,9 @@
 // not try the same connection string again for 30 seconds, unless it is asked to reconnect. A command may take 120
 // seconds.
 //
+// Records ask for reference sets whenever they are made. Where a set found no database, this thread's sets of the next
+// second are empty at once, unless DBConnect or DBExecSP was called since.
+//
 // Nothing is shared between threads and nothing is locked.
 #pragma once
 
