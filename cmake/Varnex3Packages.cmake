@@ -10,7 +10,7 @@ set(CPACK_PACKAGING_INSTALL_PREFIX /usr)
 set(CPACK_STRIP_FILES ON)
 set(CPACK_COMPONENTS_ALL ${VARNEX3_COMPONENTS})
 set(CPACK_COMPONENTS_GROUPING IGNORE)
-set(CPACK_PRE_BUILD_SCRIPTS ${PROJECT_SOURCE_DIR}/cmake/debian/documents.cmake)
+set(CPACK_PRE_BUILD_SCRIPTS ${PROJECT_SOURCE_DIR}/packaging/debian/documents.cmake)
 set(CPACK_DEB_COMPONENT_INSTALL ON)
 set(CPACK_DEBIAN_FILE_NAME DEB-DEFAULT)
 set(CPACK_DEBIAN_PACKAGE_CONTROL_STRICT_PERMISSION ON)
@@ -21,7 +21,7 @@ set(CPACK_PACKAGE_DESCRIPTION_SUMMARY "") # each package begins its description 
 set(CPACK_DEBIAN_LIBRARY_PACKAGE_NAME libvarnex3-3)
 set(CPACK_DEBIAN_LIBRARY_PACKAGE_SECTION libs)
 set(CPACK_DEBIAN_LIBRARY_PACKAGE_SHLIBDEPS ON)
-set(CPACK_DEBIAN_LIBRARY_PACKAGE_CONTROL_EXTRA ${PROJECT_SOURCE_DIR}/cmake/debian/triggers)
+set(CPACK_DEBIAN_LIBRARY_PACKAGE_CONTROL_EXTRA ${PROJECT_SOURCE_DIR}/packaging/debian/triggers)
 set(CPACK_DEBIAN_LIBRARY_PACKAGE_SUGGESTS "libodbc2, tdsodbc")
 set(CPACK_COMPONENT_LIBRARY_DESCRIPTION "object model of the Xalo message language
 The messages that a vehicle body repairer and an insurer exchange about a
@@ -52,7 +52,7 @@ set(CPACK_DEBIAN_PYTHON_PACKAGE_SECTION python)
 set(CPACK_DEBIAN_PYTHON_PACKAGE_ARCHITECTURE all)
 set(CPACK_DEBIAN_PYTHON_PACKAGE_DEPENDS "python3 (>= 3.9), libvarnex3-3 (>= ${PROJECT_VERSION})")
 set(CPACK_DEBIAN_PYTHON_PACKAGE_CONTROL_EXTRA
-    ${PROJECT_SOURCE_DIR}/cmake/debian/postinst ${PROJECT_SOURCE_DIR}/cmake/debian/prerm)
+    ${PROJECT_SOURCE_DIR}/packaging/debian/postinst ${PROJECT_SOURCE_DIR}/packaging/debian/prerm)
 set(CPACK_COMPONENT_PYTHON_DESCRIPTION "object model of the Xalo message language (Python)
 The messages that a vehicle body repairer and an insurer exchange about a
 repair job, as objects that write themselves as XML and read themselves.
@@ -64,7 +64,7 @@ install(DIRECTORY ${VARNEX3_PYTHON_DIR}/varnex3 DESTINATION lib/python3/dist-pac
     COMPONENT python EXCLUDE_FROM_ALL
     FILES_MATCHING PATTERN "*.py" PATTERN "*.pyi" PATTERN "py.typed")
 foreach(package component IN ZIP_LISTS VARNEX3_PACKAGES VARNEX3_COMPONENTS)
-    install(FILES cmake/debian/copyright DESTINATION share/doc/${package} COMPONENT ${component} EXCLUDE_FROM_ALL)
+    install(FILES packaging/debian/copyright DESTINATION share/doc/${package} COMPONENT ${component} EXCLUDE_FROM_ALL)
     install(FILES CHANGELOG.md DESTINATION share/doc/${package} COMPONENT ${component} EXCLUDE_FROM_ALL)
 endforeach()
 

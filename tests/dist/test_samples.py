@@ -1,0 +1,62 @@
+#!/usr/bin/env python3
+"""The samples for C++ and Python, run; those for C#, compiled. All samples of one name print the same.
+
+VARNEX3_SOURCE_DIR and VARNEX3_BINARY_DIR are the source and the build folder.
+"""
+
+from __future__ import annotations
+
+import os
+import pathlib
+import shutil
+import subprocess
+import sys
+import tempfile
+import unittest
+
+SOURCE = pathlib.Path(os.environ["VARNEX3_SOURCE_DIR"])
+BINARY = pathlib.Path(os.environ["VARNEX3_BINARY_DIR"])
+
+
+def run(*command: object) -> str:
+    done = subprocess.run([str(word) for word in command], cwd=SOURCE, capture_output=True, text=True, check=False)
+    return done.stdout + done.stderr
+
+
+class Samples(unittest.TestCase):
+    def setUp(self) -> None:
+        self.folder = pathlib.Path(tempfile.mkdtemp())
+        self.addCleanup(shutil.rmtree, self.folder)
+
+    def check(self, sample: str, printed: str) -> None:
+        self.assertEqual(printed, (SOURCE / f"tests/dist/expected/{sample}.txt").read_text())
+
+    def test_the_python_samples_print_what_they_should(self) -> None:
+        for sample in ("inbox", "record"):
+            with self.subTest(sample):
+                self.check(sample, run(sys.executable, "-B", SOURCE / f"samples/python/{sample}.py"))
+
+    def test_the_cpp_samples_print_what_they_should(self) -> None:
+        for sample in ("inbox", "record"):
+            with self.subTest(sample):
+                words = ["-std=c++20", "-Wall", "-Wextra", "-Werror", "-I", SOURCE, f"samples/cpp/{sample}.cpp"]
+                program = self.folder / sample
+                self.assertEqual(run("g++", *words, BINARY / "varnex3/libvarnex3.a", "-o", program), "")
+                self.check(sample, run(program))
+
+    @unittest.skipUnless(shutil.which("mcs"), "no compiler for C# is installed (scripts/setup samples)")
+    def test_the_csharp_samples_compile(self) -> None:
+        for sample in ("inbox", "record"):
+            with self.subTest(sample):
+                program = f"-out:{self.folder / sample}.exe"
+                source = f"samples/windows/{sample}.cs"
+                self.assertEqual(run("mcs", "-warn:4", "-warnaserror", "-r:Microsoft.CSharp.dll", program, source), "")
+
+    def test_the_windows_samples_for_python_are_python(self) -> None:
+        for sample in ("inbox", "record"):
+            source = SOURCE / f"samples/windows/{sample}.py"
+            compile(source.read_text(), str(source), "exec")
+
+
+if __name__ == "__main__":
+    unittest.main()

@@ -1,0 +1,186 @@
+#!/usr/bin/env python3
+"""The zip for Windows, as its README tells to use it: unpacked into a folder with blanks and letters beyond ASCII in its
+name, registered, used, unregistered; and used without registration.
+
+VARNEX3_SOURCE_DIR is the source folder; VARNEX3_WIN32 and VARNEX3_WIN64 are the builds for Windows.
+"""
+
+from __future__ import annotations
+
+import os
+import pathlib
+import re
+import shutil
+import subprocess
+import sys
+import tempfile
+import unittest
+import zipfile
+
+SOURCE = pathlib.Path(os.environ["VARNEX3_SOURCE_DIR"])
+WIN32 = pathlib.Path(os.environ.get("VARNEX3_WIN32", SOURCE / "build/win32"))
+WIN64 = pathlib.Path(os.environ.get("VARNEX3_WIN64", SOURCE / "build/win64"))
+EXPECTED = SOURCE / "tests/dist/expected"
+COMPILERS = {"win64": "x86_64-w64-mingw32-g++-win32", "win32": "i686-w64-mingw32-g++-win32"}
+WARNINGS = ("-Wall", "-Wextra", "-Werror")
+SCRIPT_HOSTS = {"win64": r"C:\windows\system32\cscript.exe", "win32": r"C:\windows\syswow64\cscript.exe"}
+
+sys.path.insert(0, str(SOURCE / "tests/windows"))
+from component import Component  # noqa: E402
+
+
+def make_zip(folder: pathlib.Path) -> pathlib.Path:
+    subprocess.run([SOURCE / "scripts/make_dist", "windows", WIN32, WIN64, folder], check=True)
+    return next(folder.glob("Varnex3-*-win.zip"))
+
+
+def unpack(archive: pathlib.Path, folder: pathlib.Path) -> pathlib.Path:
+    with zipfile.ZipFile(archive) as content:
+        content.extractall(folder)
+    return next(folder.iterdir())
+
+
+def examples_in(readme: str) -> list[str]:
+    """The indented blocks, as typed: without their indentation."""
+    blocks = re.findall(r"(?:^    .*\n)(?:^(?:    .*)?\n)*", readme, re.MULTILINE)
+    return [re.sub("^    ", "", block, flags=re.MULTILINE).strip("\n") + "\n" for block in blocks]
+
+
+def without_empty_lines(printed: str) -> str:
+    """An Echo ends the line that a record's own text has ended already."""
+    return printed.replace("\n\n", "\n")
+
+
+class Zip(unittest.TestCase):
+    component: Component
+    folder: pathlib.Path
+
+    @classmethod
+    def setUpClass(cls) -> None:
+        top = pathlib.Path(tempfile.mkdtemp(prefix="varnex3-zip-"))
+        cls.addClassCleanup(shutil.rmtree, top)
+        cls.archive = make_zip(top)
+        cls.folder = unpack(cls.archive, top / "Müllers Büro – 車")
+        cls.readme = (cls.folder / "README.txt").read_text()
+        cls.component = Component(WIN64)
+
+    def cmd(self, *words: str) -> str:
+        """What a command printed in the folder of the zip."""
+        return self.component.run("cmd", "/c", *words, folder=self.folder)
+
+    def script(self, host: str, *words: str) -> str:
+        return self.component.run(host, "//nologo", *words, folder=self.folder)
+
+    def expected(self, sample: str) -> str:
+        """What every sample of that name prints, in whatever language."""
+        return (EXPECTED / sample).with_suffix(".txt").read_text()
+
+    def first_example(self) -> tuple[str, str]:
+        """The script that the README has one type, and what it says that it prints."""
+        examples = examples_in(self.readme)
+        script = next(i for i, text in enumerate(examples) if "CreateObject" in text)
+        (self.folder / "first.vbs").write_text(examples[script], newline="\r\n")
+        self.assertEqual(examples[script + 1], "cscript //nologo first.vbs\n")
+        return "first.vbs", examples[script + 2]
+
+    def registered(self, *word: str) -> None:
+        whom = "you alone" if word else "all users"
+        self.assertEqual(self.cmd("register.cmd", *word), self.words("registered", whom))
+        self.addCleanup(self.cmd, "unregister.cmd", *word)
+
+    @staticmethod
+    def words(done: str, whom: str) -> str:
+        return "".join(f"{bits}\\Varnex3.dll is {done} for {whom}.\n" for bits in ("win64", "win32"))
+
+    # ---- the files
+
+    def test_the_same_sources_give_the_same_bytes(self) -> None:
+        with tempfile.TemporaryDirectory() as folder:
+            self.assertEqual(make_zip(pathlib.Path(folder)).read_bytes(), self.archive.read_bytes())
+
+    def test_what_is_opened_in_an_editor_has_the_line_ends_of_windows(self) -> None:
+        for file in self.folder.rglob("*"):
+            if file.is_file() and file.suffix != ".dll" and file.suffix != ".tlb" and "inbox" not in file.parts:
+                content = file.read_bytes()
+                if file.suffix != ".manifest":
+                    self.assertEqual(content.count(b"\n"), content.count(b"\r\n"), file)
+
+    def test_every_file_that_the_readme_names_is_there(self) -> None:
+        named = re.findall(r"\b(?:samples|include|docs|win32)\\[\w.\\]*\w", self.readme)
+        self.assertGreater(len(named), 5)
+        for name in named:
+            self.assertTrue((self.folder / name.replace("\\", "/")).exists(), name)
+
+    # ---- registered
+
+    def test_registered_the_first_example_and_the_samples_print_what_they_should(self) -> None:
+        self.registered()
+        example, shown = self.first_example()
+        for bits, host in SCRIPT_HOSTS.items():
+            with self.subTest(bits):
+                self.assertEqual(self.script(host, example).split(), shown.split())
+                for script in ("inbox.vbs", "inbox.js", "record.vbs"):
+                    printed = self.script(host, rf"samples\windows\{script}")
+                    self.assertEqual(without_empty_lines(printed), self.expected(script), script)
+                without_source = self.expected("record.js").replace(" from SourceDef.ParseXML", "")
+                printed = self.script(host, r"samples\windows\record.js")
+                self.assertEqual(without_empty_lines(printed), without_source)
+
+    def test_a_folder_that_is_not_there_is_told_with_number_and_words(self) -> None:
+        self.registered()
+        printed = self.script(SCRIPT_HOSTS["win64"], r"samples\windows\inbox.vbs", "nowhere")
+        self.assertEqual(printed, "0 messages\nError 30030: Folder 'nowhere' does not exist.\n")
+
+    def test_registered_the_early_bound_samples_print_what_they_should(self) -> None:
+        self.registered()
+        for bits, compiler in COMPILERS.items():
+            for sample in ("inbox", "record"):
+                with self.subTest(f"{bits} {sample}"):
+                    program = self.folder / f"{bits}-{sample}.exe"
+                    source = self.folder / f"samples/windows/{sample}.cpp"
+                    words = ["-std=c++17", "-static", *WARNINGS, "-isystem", self.folder / "include", source, "-o", program]
+                    subprocess.run([compiler, *words, "-lole32", "-loleaut32", "-luuid"], check=True)
+                    printed = self.component.run(program, folder=self.folder)
+                    self.assertEqual(without_empty_lines(printed), self.expected(sample))
+
+    def test_unregistered_no_object_can_be_made(self) -> None:
+        self.registered()
+        self.assertEqual(self.cmd("unregister.cmd"), self.words("unregistered", "all users"))
+        example, _ = self.first_example()
+        for host in SCRIPT_HOSTS.values():
+            self.assertNotIn("<Vehicle>", self.script(host, example))
+
+    def test_one_user_registers_and_unregisters_without_the_machine(self) -> None:
+        self.registered("user")
+        key = r"\Software\Classes\Varnex3.VehicleDef\CLSID"
+        self.assertIn("{", self.cmd("reg", "query", "HKCU" + key))
+        self.assertNotIn("{", self.cmd("reg", "query", "HKLM" + key))
+        self.assertEqual(self.cmd("unregister.cmd", "user"), self.words("unregistered", "you alone"))
+        self.assertNotIn("{", self.cmd("reg", "query", "HKCU" + key))
+
+    def test_what_cannot_be_registered_is_told_in_words(self) -> None:
+        library = self.folder / "win32/Varnex3.dll"
+        library.rename(library.with_suffix(".away"))
+        self.addCleanup(lambda: library.with_suffix(".away").rename(library))
+        self.addCleanup(self.cmd, "unregister.cmd")
+        self.assertIn(r"win32\Varnex3.dll could not be registered: it cannot be loaded.", self.cmd("register.cmd"))
+        self.assertIn("the only word it takes is user", self.cmd("register.cmd", "me"))
+
+    # ---- not registered
+
+    def test_beside_a_program_with_the_manifest_of_the_readme_nothing_is_registered(self) -> None:
+        manifest = next(text for text in examples_in(self.readme) if "<dependency>" in text)
+        for bits, host in SCRIPT_HOSTS.items():
+            with self.subTest(bits):
+                folder = self.folder / bits
+                program = self.component.drive / host.removeprefix("C:\\").replace("\\", "/")
+                shutil.copy(program, folder)
+                architecture = 'processorArchitecture="' + ("x86" if bits == "win32" else "amd64")
+                own = re.sub('processorArchitecture="[^"]*', architecture, manifest)
+                (folder / "cscript.exe.manifest").write_text(own)
+                printed = self.script(str(folder / "cscript.exe"), r"samples\windows\record.vbs")
+                self.assertEqual(without_empty_lines(printed), self.expected("record"))
+
+
+if __name__ == "__main__":
+    unittest.main()
