@@ -26,9 +26,8 @@ std::string ToText(const Class& described, const Library& library)
 {
     const std::string name = library.name + "." + described.name;
     return "    <comClass" + Attribute("clsid", Braced(described.guid)) + Attribute("progid", name)
-           + Attribute("threadingModel", "Apartment") + Attribute("tlbid", Braced(library.guid))
-           + Attribute("description", described.doc) + ">\n      <progid>" + name + "." + std::to_string(library.major)
-           + "</progid>\n    </comClass>\n";
+           + Attribute("threadingModel", "Apartment") + Attribute("tlbid", Braced(library.guid)) + ">\n      <progid>"
+           + name + "." + std::to_string(library.major) + "</progid>\n    </comClass>\n";
 }
 
 std::string InterfaceOf(const Class& described, const Library& library)
