@@ -4,7 +4,7 @@ BUILD := build/release
 CMAKE_BUILD = cmake --build --preset $(1) --parallel $(JOBS)
 
 .DEFAULT_GOAL := build
-.PHONY: help setup build demo test sanitize threads windows bench format layout tidy docs install clean
+.PHONY: help setup build demo test sanitize threads windows dist delphi bench format layout tidy docs install clean
 
 help: ## this list
 	@sed -n 's/^\([a-z]*\):.*## /\1\t/p' $(MAKEFILE_LIST) | expand -t 12
@@ -39,6 +39,15 @@ threads: setup ## build with the thread sanitizer and run the tests of the datab
 windows: build ## build the component for 32-bit and 64-bit Windows into build/win32 and build/win64
 	@scripts/setup windows
 	@for bits in win32 win64; do cmake --preset $$bits && $(call CMAKE_BUILD,$$bits) || exit; done
+
+dist: build windows ## the zip for Windows and the Debian packages, into build/dist
+	@rm -rf build/dist
+	@scripts/make_dist windows build/win32 build/win64 build/dist
+	@scripts/make_dist debian $(BUILD) build/dist
+	@ls -l build/dist
+
+delphi: ## compile the Delphi samples for Windows into build/delphi (once: some minutes, 420 MB)
+	@tests/dist/compile_delphi build/delphi
 
 bench: setup ## measure against the peers, print the ratios
 	@scripts/setup bench
