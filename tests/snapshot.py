@@ -2,6 +2,7 @@
 
 from __future__ import annotations
 
+import difflib
 import re
 
 FUNCTIONS = "functions of the C library"
@@ -49,6 +50,12 @@ def differences(expected: str, found: str) -> list[str]:
     if not told:
         told += [f"{a} has changed its place with {b}" for a, b in zip(before, after) if a != b][:1]
     return told
+
+
+def changed_lines(expected: str, found: str) -> str:
+    """Of two texts of any kind, the lines that differ."""
+    lines = difflib.unified_diff(expected.splitlines(), found.splitlines(), "recorded", "found", lineterm="", n=0)
+    return "\n".join(lines)
 
 
 def section(listing: str, first: str, after: str | None) -> str:
