@@ -4,6 +4,7 @@ from __future__ import annotations
 
 import difflib
 import re
+import unittest
 
 FUNCTIONS = "functions of the C library"
 HEADING = re.compile(rf"^(library|enum|class|module|{FUNCTIONS})\b *(\w*)")
@@ -75,3 +76,11 @@ def component(listing: str) -> str:
 def symbols(listing: str) -> list[str]:
     """The functions that the C library exports."""
     return section(listing, FUNCTIONS, None).split("\n", 1)[1].split()
+
+
+class Comparison(unittest.TestCase):
+    """Says what differs and nothing else."""
+
+    def assert_nothing(self, told: str) -> None:
+        if told:
+            self.fail(f"\n{told}")

@@ -33,7 +33,7 @@ functions of the C library
 """
 
 
-class Recorded(unittest.TestCase):
+class Recorded(snapshot.Comparison):
     """If the change is meant: scripts/interface, and a word in the change log."""
 
     folder: pathlib.Path
@@ -47,12 +47,12 @@ class Recorded(unittest.TestCase):
 
     def test_the_listing_says_what_the_build_has(self) -> None:
         built = (self.folder / "interface.txt").read_text()
-        self.assertEqual("\n".join(snapshot.differences(RECORDED, built)), "")
-        self.assertEqual(snapshot.changed_lines(RECORDED, built), "")
+        self.assert_nothing("\n".join(snapshot.differences(RECORDED, built)))
+        self.assert_nothing(snapshot.changed_lines(RECORDED, built))
 
     def test_the_idl_is_the_one_that_the_build_compiles(self) -> None:
         recorded, built = (folder / "interface.idl" for folder in (SOURCE / "docs", self.folder))
-        self.assertEqual(snapshot.changed_lines(recorded.read_text(), built.read_text()), "")
+        self.assert_nothing(snapshot.changed_lines(recorded.read_text(), built.read_text()))
 
 
 class Listing(unittest.TestCase):

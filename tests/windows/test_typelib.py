@@ -36,7 +36,7 @@ def told(*command: object) -> str:
     return subprocess.run([str(word) for word in command], capture_output=True, text=True, check=True).stdout
 
 
-class InsideTheComponent(unittest.TestCase):
+class InsideTheComponent(snapshot.Comparison):
     component: Component
 
     @classmethod
@@ -48,13 +48,13 @@ class InsideTheComponent(unittest.TestCase):
 
     def test_the_type_library_says_what_is_recorded(self) -> None:
         recorded, read = snapshot.component(RECORDED).strip(), self.read().strip()
-        self.assertEqual("\n".join(snapshot.differences(recorded, read)), "")
-        self.assertEqual(snapshot.changed_lines(recorded, read), "")
+        self.assert_nothing("\n".join(snapshot.differences(recorded, read)))
+        self.assert_nothing(snapshot.changed_lines(recorded, read))
 
     def test_the_help_strings_are_the_words_of_the_rows(self) -> None:
         rows = told(NATIVE / "varnex3/server/idl/varnex3_idl", "--help-strings")
         self.assertIn("VersionDef.DLLVersion: ", rows)
-        self.assertEqual(snapshot.changed_lines(rows, self.read("--help-strings")), "")
+        self.assert_nothing(snapshot.changed_lines(rows, self.read("--help-strings")))
 
     def test_the_entries_of_a_component_and_the_functions_of_the_c_library_are_exported_and_nothing_else(self) -> None:
         table = told("objdump", "-p", BINARY / LIBRARY).partition("[Ordinal/Name Pointer] Table")[2].partition("\n\n")[0]
@@ -62,10 +62,10 @@ class InsideTheComponent(unittest.TestCase):
         self.assertEqual(sorted(names), sorted(ENTRIES + snapshot.symbols(RECORDED)))
 
 
-class BesideTheComponent(unittest.TestCase):
+class BesideTheComponent(snapshot.Comparison):
     def test_the_idl_is_the_recorded_one(self) -> None:
         recorded, built = (SOURCE / "docs/interface.idl").read_text(), (BINARY / "Varnex3.idl").read_text()
-        self.assertEqual(snapshot.changed_lines(recorded, built), "")
+        self.assert_nothing(snapshot.changed_lines(recorded, built))
 
     def compile(self, compiler: str, suffix: str, program: str) -> None:
         target = "i686" if is_32_bit(BINARY / LIBRARY) else "x86_64"
