@@ -4,14 +4,12 @@
 //     varnex3_rules tests/rules SourceDef    the files whose name begins so
 //
 // README.md describes the files.
-#include <unistd.h>
-
 #include <algorithm>
-#include <cstdlib>
 #include <filesystem>
 #include <fstream>
 #include <iostream>
 #include <map>
+#include <random>
 #include <string>
 #include <vector>
 
@@ -60,6 +58,7 @@ private:
     void Compare(const Json& expected, const Json& got);
 
     Record& Object(const Json& name);
+    std::string AsPath(std::string text) const;
     std::string Filled(std::string text) const;
     std::string PlainText(const Json& json) const;
     Variant ToVariant(const Json& json);
@@ -80,7 +79,16 @@ Record& Rule::Object(const Json& name)
     return *found->second;
 }
 
-// The text with ${i} and the paths of the rule's folders filled in.
+// A text of a rule with folders, its slashes as the system writes them.
+std::string Rule::AsPath(std::string text) const
+{
+    constexpr char kSeparator = static_cast<char>(fs::path::preferred_separator);
+    if (!folders.empty())
+        std::ranges::replace(text, '/', kSeparator);
+    return text;
+}
+
+// The text with ${i} and the paths of the rule's folders filled in, the slashes behind these as the system writes them.
 std::string Rule::Filled(std::string text) const
 {
     const auto fill = [&](const std::string& name, const std::string& value) {
@@ -89,8 +97,11 @@ std::string Rule::Filled(std::string text) const
             text.replace(at, mark.size(), value);
     };
     fill("i", turn);
-    for (const auto& [name, path] : folders)
+    for (const auto& [name, path] : folders) {
+        if (text.find("${" + name + "}") != std::string::npos)
+            text = AsPath(text);
         fill(name, path);
+    }
     return text;
 }
 
@@ -222,7 +233,7 @@ void Rule::DoRaises(const Json& step)
         const std::string description = ToUtf8(error.Description());
         if (got != expected)
             throw Failure("expected error " + expected + ", got " + got + ": " + Shown(description));
-        if (hasWords && description.find(Filled(step[3])) == std::string::npos)
+        if (hasWords && description.find(AsPath(Filled(step[3]))) == std::string::npos)
             throw Failure("expected the description to say " + Shown(step[3]) + ", got " + Shown(description));
         return;
     }
@@ -261,14 +272,20 @@ void Rule::DoRepeat(const Json& step)
     }
 }
 
+fs::path NewFolder()
+{
+    const fs::path path = fs::temp_directory_path() / ("varnex3-rule-" + std::to_string(std::random_device()()));
+    if (!fs::create_directory(path))
+        throw Failure("no temporary folder");
+    return path;
+}
+
 void Rule::DoFolder(const Json& step)
 {
-    std::string path = (fs::temp_directory_path() / "varnex3-rule-XXXXXX").string();
-    if (!mkdtemp(path.data()))
-        throw Failure("no temporary folder");
-    folders[step.at(1)] = path;
+    const fs::path path = NewFolder();
+    folders[step.at(1)] = path.string();
     for (const auto& [name, content] : step.at(2).items()) {
-        const fs::path file = fs::path(path) / name;
+        const fs::path file = path / ToUtf16(name);
         fs::create_directories(file.parent_path());
         if (content.is_null()) {
             fs::create_directory(file);

@@ -9,14 +9,26 @@
 #include <vector>
 
 #include "varnex3/services/Registry.h"
-#include "varnex3/services/RegistryLine.h"
 
 namespace varnex3::tests {
+
+// As keys and values are told apart: without regard to upper and lower case.
+inline std::string Folded(std::string name)
+{
+    for (char& c : name)
+        c = c >= 'A' && c <= 'Z' ? static_cast<char>(c + 32) : c;
+    return name;
+}
 
 class MemoryRegistry final : public Registry
 {
 public:
-    using Values = std::map<std::string, RegistryValue>;
+    struct Value
+    {
+        RegistryType type;
+        std::string data;
+    };
+    using Values = std::map<std::string, Value>;
 
     // As "HKLM\SOFTWARE\a", upper and lower case alike.
     std::map<std::string, Values> keys;
@@ -28,7 +40,7 @@ public:
 
     void Put(const std::string& key, const std::string& name, RegistryType type, const std::string& data)
     {
-        keys[FoldedName(key)][FoldedName(name)] = {type, data};
+        keys[Folded(key)][Folded(name)] = {type, data};
     }
     void PutText(const std::string& key, const std::string& name, const std::string& text)
     {
@@ -37,10 +49,10 @@ public:
     // The value as the data are, or "none".
     std::string At(const std::string& key, const std::string& name) const
     {
-        const auto values = keys.find(FoldedName(key));
-        if (values == keys.end() || !values->second.contains(FoldedName(name)))
+        const auto values = keys.find(Folded(key));
+        if (values == keys.end() || !values->second.contains(Folded(name)))
             return "none";
-        return values->second.at(FoldedName(name)).data;
+        return values->second.at(Folded(name)).data;
     }
     std::size_t OpenHandles() const { return open.size(); }
 
@@ -48,10 +60,10 @@ public:
     {
         key = RegistryKey::Invalid;
         calls.push_back("open " + NameOf(root, path));
-        if (!keys.contains(FoldedName(NameOf(root, path))))
+        if (!keys.contains(Folded(NameOf(root, path))))
             return RegistryStatus::NotFound;
         key = static_cast<RegistryKey>(++last);
-        open[key] = FoldedName(NameOf(root, path));
+        open[key] = Folded(NameOf(root, path));
         return RegistryStatus::Done;
     }
 
@@ -61,9 +73,9 @@ public:
         calls.push_back("create " + NameOf(root, path));
         if (!canCreate)
             return RegistryStatus::AccessDenied;
-        keys[FoldedName(NameOf(root, path))];
+        keys[Folded(NameOf(root, path))];
         key = static_cast<RegistryKey>(++last);
-        open[key] = FoldedName(NameOf(root, path));
+        open[key] = Folded(NameOf(root, path));
         return RegistryStatus::Done;
     }
 
@@ -73,9 +85,9 @@ public:
         const Values& values = keys.at(open.at(key));
         if (queryFault != RegistryStatus::Done)
             return {queryFault, RegistryType::Text, 0};
-        if (!values.contains(FoldedName(name)))
+        if (!values.contains(Folded(name)))
             return {RegistryStatus::NotFound, RegistryType::Text, 0};
-        const RegistryValue& value = values.at(FoldedName(name));
+        const Value& value = values.at(Folded(name));
         const bool fits = value.data.size() <= buffer.size();
         if (fits)
             std::ranges::copy(value.data, buffer.begin());
@@ -87,14 +99,14 @@ public:
         calls.push_back("set " + name);
         if (readOnly.contains(open.at(key)))
             return RegistryStatus::AccessDenied;
-        keys.at(open.at(key))[FoldedName(name)] = {type, std::string(data)};
+        keys.at(open.at(key))[Folded(name)] = {type, std::string(data)};
         return RegistryStatus::Done;
     }
 
     RegistryStatus Delete(RegistryRoot root, const std::string& path) override
     {
         calls.push_back("delete " + NameOf(root, path));
-        return keys.erase(FoldedName(NameOf(root, path))) > 0 ? RegistryStatus::Done : RegistryStatus::NotFound;
+        return keys.erase(Folded(NameOf(root, path))) > 0 ? RegistryStatus::Done : RegistryStatus::NotFound;
     }
 
     RegistryStatus Close(RegistryKey key) override

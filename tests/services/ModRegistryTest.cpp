@@ -155,7 +155,7 @@ TEST_CASE("GetAppSetting: migration without the right to write fails silently")
     CHECK(registry.At(kMachineKey, "Key") == "none");
 
     registry.PutText(kMachineKey, "Other", "");
-    registry.readOnly = {FoldedName(kMachineKey)};
+    registry.readOnly = {tests::Folded(kMachineKey)};
     CHECK(Setting(registry, u"D", false) == u"D");
     CHECK(registry.At(kMachineKey, "Key") == "none");
     CHECK(registry.OpenHandles() == 0);
@@ -176,7 +176,7 @@ TEST_CASE("QueryRegValue: a text, with or without the zero byte at its end")
     CHECK(Read(RegistryType::Text, std::string("abc\0", 4)) == u"abc");
     CHECK(Read(RegistryType::Text, "abc") == u"abc");
     CHECK(Read(RegistryType::Text, std::string("abc\0\0", 5)) == Text(u"abc\0", 4)); // one zero byte is cut
-    CHECK(Read(RegistryType::Text, "caf\xC3\xA9") == u"caf\u00E9");
+    CHECK(Read(RegistryType::Text, ToCodePage(u"caf\u00E9")) == Text(u"caf\u00E9"));
 }
 
 TEST_CASE("QueryRegValue: a missing key or value is the empty text, and no key stays open")
@@ -216,11 +216,9 @@ TEST_CASE("QueryRegValue: 1024 bytes can be read, 1025 cannot")
 
 TEST_CASE("QueryRegValue: the buffer's size counts bytes, not characters")
 {
-    std::string accents;
-    while (accents.size() < 1024)
-        accents += "\xC3\xA9";
-    CHECK(Read(RegistryType::Text, accents) == Text(512, u'\u00E9'));
-    CHECK(Read(RegistryType::Text, accents + "e") == u"");
+    const Text accents(1024 / ToCodePage(u"\u00E9").size(), u'\u00E9'); // two bytes each where the code page is UTF-8
+    CHECK(Read(RegistryType::Text, ToCodePage(accents)) == accents);
+    CHECK(Read(RegistryType::Text, ToCodePage(accents) + "e") == u"");
 }
 
 TEST_CASE("QueryRegValue: a 32-bit number is read from its bytes' hexadecimal digits without leading zeros")
@@ -266,7 +264,7 @@ TEST_CASE("SetRegValue: a new value is a text, written without a zero byte at it
     MemoryRegistry registry;
     registry.keys["hklm\\k"];
     CHECK(SetRegValue(kMachine, u"k", u"v", u"caf\u00E9", registry));
-    CHECK(registry.At("HKLM\\k", "v") == "caf\xC3\xA9");
+    CHECK(registry.At("HKLM\\k", "v") == ToCodePage(u"caf\u00E9"));
     CHECK(registry.keys["hklm\\k"]["v"].type == RegistryType::Text);
     CHECK(registry.OpenHandles() == 0);
 }

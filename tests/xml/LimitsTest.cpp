@@ -1,7 +1,11 @@
 // No limits by accident: depth, numbers and lengths are bounded by memory alone.
 #include "Documents.h"
 
+#ifdef _WIN32
+#include <windows.h>
+#else
 #include <sys/mman.h>
+#endif
 
 namespace varnex3::xml {
 namespace {
@@ -21,12 +25,21 @@ constexpr std::size_t million = 1'000'000;
 class ZeroBytes
 {
 public:
+#ifdef _WIN32
+    explicit ZeroBytes(std::size_t count)
+        : size(count), memory(VirtualAlloc(nullptr, size, MEM_RESERVE | MEM_COMMIT, PAGE_READONLY))
+    {
+        REQUIRE(memory != nullptr);
+    }
+    ~ZeroBytes() { VirtualFree(memory, 0, MEM_RELEASE); }
+#else
     explicit ZeroBytes(std::size_t count)
         : size(count), memory(mmap(nullptr, size, PROT_READ, MAP_PRIVATE | MAP_ANONYMOUS | MAP_NORESERVE, -1, 0))
     {
         REQUIRE(memory != MAP_FAILED);
     }
     ~ZeroBytes() { munmap(memory, size); }
+#endif
     ZeroBytes(const ZeroBytes&) = delete;
     ZeroBytes& operator=(const ZeroBytes&) = delete;
 
