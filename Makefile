@@ -23,8 +23,8 @@ demo: setup build ## build what is missing, summarise the sample inbox, show the
 	@$(BUILD)/tools/varnex3 scan samples/inbox; test $$? -le 1
 	@echo; $(BUILD)/tools/varnex3 doctor; test $$? -le 1
 
-test: setup build ## build and run every test
-	@scripts/run_tests $(BUILD)
+test: setup build windows ## build and run every test, those of the component under Wine
+	@scripts/run_tests $(BUILD) build/win32 build/win64
 
 sanitize: setup ## build with the address and undefined-behaviour sanitizers and run every test
 	@cmake --preset asan
