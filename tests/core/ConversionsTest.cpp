@@ -228,6 +228,31 @@ TEST_CASE("FormatAmount: two decimals, halves away from zero as the decimal text
     CHECK(FormatAmount(1234.5) == u"1234.50");
 }
 
+TEST_CASE("FormatAmount: every thousandth is rounded as its digits say")
+{
+    int wrong = 0;
+    for (std::int32_t thousandths = 0; thousandths < 300000; ++thousandths) {
+        const std::int32_t hundredths = (thousandths + 5) / 10;
+        const std::string digits = std::to_string(1000 + hundredths % 100).substr(2);
+        wrong += FormatAmount(thousandths / 1000.0) != ToUtf16(std::to_string(hundredths / 100) + "." + digits);
+    }
+    CHECK(wrong == 0);
+}
+
+TEST_CASE("NumberFrom: plain digits with a point give the nearest double, as the long way does")
+{
+    int wrong = 0;
+    for (std::int32_t i = 0; i < 100000; ++i) {
+        const std::string digits = std::to_string(i * 7919LL);
+        const std::string text = digits.substr(0, digits.size() / 2) + "." + digits.substr(digits.size() / 2);
+        wrong += NumberFrom(ToUtf16(text)) != NumberFrom(ToUtf16(text + "e0")); // an exponent goes the long way
+    }
+    CHECK(wrong == 0);
+    CHECK(NumberFrom(u"007.50") == 7.5);
+    CHECK(NumberFrom(u"123456789012345") == 123456789012345.0);
+    CHECK(NumberFrom(u"0.1234567890123456789") == 0.1234567890123456789);
+}
+
 TEST_CASE("FormatAmount: the carry runs as far as it must")
 {
     CHECK(FormatAmount(0.995) == u"1.00");

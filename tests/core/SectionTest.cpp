@@ -172,3 +172,41 @@ TEST_CASE("ReadIntoWhereUsed: a child reads its section, and an absent one only 
     CHECK_FALSE(section->ReadIntoWhereUsed(unused, "A/Other"));
     CHECK_FALSE(unused.IsMade());
 }
+
+TEST_CASE("Verbs find the first element of a name, whatever stands around it and in whatever order they ask")
+{
+    constexpr ElementPath paths[] = {"R/A", "R/B", "R/AB", "R/BA", "R/Part", "R/Prat", "R/Total", "R/Towing"};
+    std::mt19937 random(1);
+    const auto any = [&] { return paths[random() % std::size(paths)]; };
+    int wrong = 0;
+    for (int i = 0; i < 2000; ++i) {
+        Text text = u"<R>";
+        for (auto children = random() % 8; children > 0; --children) {
+            const Text name = ToText(any().Inner());
+            text += u"<" + name + u">" + Text(1, static_cast<char16_t>(u'a' + children)) + u"</" + name + u">";
+        }
+        const TextSection section(text + u"</R>");
+        for (int j = 0; j < 12; ++j) {
+            const ElementPath path = any();
+            wrong += section->TextAt(path) != section.document.SelectSingle(path.Whole()).Text();
+        }
+    }
+    CHECK(wrong == 0);
+}
+
+TEST_CASE("ElementPath: the group, what follows it, its last step; blanks around the rest do not matter")
+{
+    constexpr ElementPath path("Vehicle/ModelID ");
+    CHECK(path.Group() == "Vehicle");
+    CHECK(path.Inner() == "ModelID");
+    CHECK_FALSE(path.IsDeep());
+    CHECK(path.LastStep() == "ModelID");
+    CHECK(path.Whole() == "Vehicle/ModelID");
+    constexpr ElementPath deep("A/B/C");
+    CHECK(deep.IsDeep());
+    CHECK(deep.LastStep() == "C");
+    CHECK(ElementPath("A").IsGroup());
+    CHECK(ElementPath("A").LastStep() == "A");
+    const TextSection section(u"<A><B><D/></B><B><C>x</C></B></A>");
+    CHECK(section->TextAt("A/B/C") == u"x");
+}

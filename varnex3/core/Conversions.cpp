@@ -123,9 +123,37 @@ bool IsTooSmall(std::string_view form)
     return place + (hasNegativeExponent ? -exponent : exponent) < 0;
 }
 
+// The number of a text that is digits with at most one point among them; nothing for every other text. A quotient of
+// two numbers that are exact is rounded once, so the result is the nearest double, as that of from_chars.
+std::optional<double> TryPlainNumber(TextView text)
+{
+    constexpr std::size_t kMostExactDigits = 15;
+    constexpr double kPowers[] = {1e0, 1e1, 1e2, 1e3, 1e4, 1e5, 1e6, 1e7, 1e8, 1e9, 1e10, 1e11, 1e12, 1e13, 1e14, 1e15};
+    if (text.size() > kMostExactDigits)
+        return std::nullopt;
+    std::int64_t digits = 0;
+    std::size_t count = 0;
+    std::size_t point = text.size();
+    for (std::size_t i = 0; i < text.size(); ++i) {
+        if (IsDigit(text[i])) {
+            digits = digits * 10 + (text[i] - u'0');
+            ++count;
+        } else if (text[i] == u'.' && point == text.size()) {
+            point = i + 1;
+        } else {
+            return std::nullopt;
+        }
+    }
+    if (count == 0)
+        return std::nullopt;
+    return static_cast<double>(digits) / kPowers[text.size() - point];
+}
+
 // Nothing when the text does not have the form of a number.
 std::optional<double> TryNumber(TextView text)
 {
+    if (const std::optional<double> plain = TryPlainNumber(text))
+        return plain;
     const std::optional<std::string> form = NumberForm(text);
     if (!form)
         return std::nullopt;
@@ -139,14 +167,31 @@ std::optional<double> TryNumber(TextView text)
 }
 
 template <class Integer>
-Integer ToInteger(const Variant& value, TextView type)
+std::optional<Integer> Rounded(double number)
 {
-    const double rounded = std::nearbyint(ToDouble(value)); // halves to even: the default rounding mode
+    const double rounded = std::nearbyint(number); // halves to even: the default rounding mode
     const bool isInRange =
         rounded >= std::numeric_limits<Integer>::min() && rounded <= std::numeric_limits<Integer>::max();
-    if (!isInRange)
-        Outside(ToText(value), type);
-    return static_cast<Integer>(rounded);
+    return isInRange ? std::optional(static_cast<Integer>(rounded)) : std::nullopt;
+}
+
+constexpr TextView kInt16 = u"a 16-bit integer";
+constexpr TextView kInt32 = u"a 32-bit integer";
+
+template <class Integer>
+Integer IntegerFrom(TextView text, TextView type)
+{
+    if (const std::optional<Integer> integer = Rounded<Integer>(NumberFrom(text)))
+        return *integer;
+    Outside(text, type);
+}
+
+template <class Integer>
+Integer ToInteger(const Variant& value, TextView type)
+{
+    if (const std::optional<Integer> integer = Rounded<Integer>(ToDouble(value)))
+        return *integer;
+    Outside(ToText(value), type);
 }
 
 Text Widened(const char* first, const char* last) { return {first, last}; }
@@ -197,9 +242,13 @@ double ToDouble(const Variant& value)
                       value);
 }
 
-std::int16_t ToInt16(const Variant& value) { return ToInteger<std::int16_t>(value, u"a 16-bit integer"); }
+std::int16_t Int16From(TextView text) { return IntegerFrom<std::int16_t>(text, kInt16); }
 
-std::int32_t ToInt32(const Variant& value) { return ToInteger<std::int32_t>(value, u"a 32-bit integer"); }
+std::int32_t Int32From(TextView text) { return IntegerFrom<std::int32_t>(text, kInt32); }
+
+std::int16_t ToInt16(const Variant& value) { return ToInteger<std::int16_t>(value, kInt16); }
+
+std::int32_t ToInt32(const Variant& value) { return ToInteger<std::int32_t>(value, kInt32); }
 
 bool ToBoolean(const Variant& value)
 {
@@ -257,8 +306,51 @@ std::int16_t CountOf(std::size_t count, Name operation)
     return static_cast<std::int16_t>(count);
 }
 
+NumberText::NumberText(std::int32_t value)
+{
+    PutDigits(static_cast<std::uint64_t>(std::abs(std::int64_t{value})));
+    if (value < 0)
+        Put('-');
+}
+
+bool NumberText::PutAmount(double amount)
+{
+    // Both the double and its shortest decimal text differ from the amount by far less than this share of a hundredth.
+    constexpr double kNear = 1e-3;
+    constexpr double kMost = 1e10;
+    const double size = std::abs(amount);
+    if (!(size < kMost)) // not a number, too
+        return false;
+
+    const double hundredths = size * 100;
+    auto value = static_cast<std::uint64_t>(hundredths);
+    const double rest = hundredths - static_cast<double>(value);
+    if (std::abs(rest - 0.5) < kNear)
+        return false;
+
+    value += rest > 0.5 ? 1 : 0;
+    Put(static_cast<char>('0' + value % 10));
+    Put(static_cast<char>('0' + value / 10 % 10));
+    Put('.');
+    PutDigits(value / 100);
+    if (amount < 0 && value > 0)
+        Put('-');
+    return true;
+}
+
+// In front of what is there already.
+void NumberText::PutDigits(std::uint64_t value)
+{
+    do {
+        Put(static_cast<char>('0' + value % 10));
+        value /= 10;
+    } while (value > 0);
+}
+
 Text FormatAmount(double amount)
 {
+    if (NumberText text; text.PutAmount(amount))
+        return Text(text.View());
     if (!std::isfinite(amount))
         throw Error(ErrorNumber::Overflow, {}, u"an amount that is not a finite number");
 

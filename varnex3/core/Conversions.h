@@ -14,6 +14,7 @@
 // value but have no source: the operation that converts adds it (Error::About).
 #pragma once
 
+#include <array>
 #include <cstdint>
 #include <optional>
 
@@ -22,6 +23,8 @@
 namespace varnex3 {
 
 double NumberFrom(TextView text);
+std::int16_t Int16From(TextView text);
+std::int32_t Int32From(TextView text);
 Date DateFrom(TextView text);
 
 double ToDouble(const Variant& value);
@@ -47,5 +50,27 @@ std::int16_t CountOf(std::size_t count, Name operation);
 // halves away from zero: 1.005 gives "1.01", -0.005 "-0.01"; zero has no sign. Raises Overflow for infinities and
 // not-a-number.
 Text FormatAmount(double amount);
+
+// A number as FormatAmount and ToText give it, in room of its own: nothing is allocated.
+class NumberText
+{
+public:
+    explicit NumberText(std::int32_t value);
+
+    // False, and no text, for the amounts that FormatAmount has to look at more closely: very large ones and those near
+    // the middle of two hundredths.
+    NumberText() = default;
+    bool PutAmount(double amount);
+
+    TextView View() const { return {room.data() + start, room.size() - start}; }
+
+private:
+    void PutDigits(std::uint64_t value);
+    void Put(char character) { room[--start] = static_cast<char16_t>(character); }
+
+    static constexpr std::size_t kRoom = 24;
+    std::array<char16_t, kRoom> room; // NOLINT(cppcoreguidelines-pro-type-member-init): filled from its end
+    std::size_t start = kRoom;
+};
 
 } // namespace varnex3

@@ -12,8 +12,6 @@ namespace {
 
 std::string ParseXMLOf(Name reader) { return std::string(reader) + ".ParseXML"; }
 
-Name LastStep(Name path) { return path.substr(path.rfind('/') + 1); }
-
 // Date and time of an ISO text, without fraction and zone.
 Date TimestampFrom(TextView text)
 {
@@ -27,72 +25,108 @@ Date TimestampFrom(TextView text)
 
 } // namespace
 
-xml::Node XmlSection::Find(Name path) const
+bool XmlSection::IsNamed(Name group) const
 {
-    const std::size_t slash = path.find('/');
-    if (!element.IsElement(path.substr(0, slash)))
-        return {};
-    return slash == Name::npos ? element : element.SelectSingle(path.substr(slash + 1));
+    if (lastGroup != group) {
+        lastGroup = group;
+        isLastGroup = element.IsElement(group);
+    }
+    return isLastGroup;
 }
 
-xml::Node XmlSection::Require(Name path) const
+const xml::ChildNames& XmlSection::Names() const
+{
+    if (!hasNames) {
+        hasNames = true;
+        names = element.NamesOfChildren();
+    }
+    return names;
+}
+
+// The first child of a name. One that may be there but once is looked for behind the last one found first.
+xml::Node XmlSection::FindChild(ElementPath path) const
+{
+    xml::Node found;
+    if (!xml::Has(Names().repeated, path.Bit()))
+        found = lastFound.NextSiblingElement(path.Inner());
+    if (!found)
+        found = element.FirstChildElement(path.Inner());
+    if (found)
+        lastFound = found;
+    return found;
+}
+
+xml::Node XmlSection::Find(ElementPath path) const
+{
+    if (!element || !IsNamed(path.Group()))
+        return {};
+    if (path.IsGroup())
+        return element;
+    if (!xml::Has(Names().all, path.Bit()))
+        return {};
+    return path.IsDeep() ? element.SelectSingle(path.Inner()) : FindChild(path);
+}
+
+xml::Node XmlSection::Require(ElementPath path) const
 {
     if (const xml::Node node = Find(path))
         return node;
-    Raise(ErrorNumber::ObjectNotSet, ParseXMLOf(reader), u"the element " + ToText(path) + u" is missing");
+    Raise(ErrorNumber::ObjectNotSet, ParseXMLOf(reader), u"the element " + ToText(path.Whole()) + u" is missing");
 }
 
 template <class Convert>
-auto XmlSection::Converted(Name path, TextView text, Convert convert) const
+auto XmlSection::Converted(ElementPath path, TextView text, Convert convert) const
 {
     try {
         return convert(text);
     } catch (const Error& error) {
-        throw error.About(ParseXMLOf(reader), ToText(LastStep(path)));
+        throw error.About(ParseXMLOf(reader), ToText(path.LastStep()));
     }
 }
 
-Text XmlSection::TextAt(Name path) const { return Find(path).Text(); }
+Text XmlSection::TextAt(ElementPath path) const { return Find(path).Text(); }
 
-Text XmlSection::RequiredTextAt(Name path) const { return Require(path).Text(); }
+Text XmlSection::RequiredTextAt(ElementPath path) const { return Require(path).Text(); }
 
-double XmlSection::NumberAt(Name path) const
+double XmlSection::NumberAt(ElementPath path) const
 {
     const xml::Node node = Find(path);
-    return node ? Converted(path, node.Text(), [](TextView text) { return NumberFrom(text); }) : 0;
+    return node ? Converted(path, node.Text(), NumberFrom) : 0;
 }
 
-std::int16_t XmlSection::Int16At(Name path) const
+std::int16_t XmlSection::Int16At(ElementPath path) const
 {
     const xml::Node node = Find(path);
-    return node ? Converted(path, node.Text(), [](TextView text) { return ToInt16(Text(text)); }) : std::int16_t{0};
+    return node ? Converted(path, node.Text(), Int16From) : std::int16_t{0};
 }
 
-std::int32_t XmlSection::Int32At(Name path) const
+std::int32_t XmlSection::Int32At(ElementPath path) const
 {
     const xml::Node node = Find(path);
-    return node ? Converted(path, node.Text(), [](TextView text) { return ToInt32(Text(text)); }) : 0;
+    return node ? Converted(path, node.Text(), Int32From) : 0;
 }
 
-Date XmlSection::RequiredTimestampAt(Name path) const { return Converted(path, RequiredTextAt(path), TimestampFrom); }
+Date XmlSection::RequiredTimestampAt(ElementPath path) const
+{
+    return Converted(path, RequiredTextAt(path), TimestampFrom);
+}
 
-Date XmlSection::TimestampAt(Name path) const { return Converted(path, TextAt(path), TimestampFrom); }
+Date XmlSection::TimestampAt(ElementPath path) const { return Converted(path, TextAt(path), TimestampFrom); }
 
-Date XmlSection::TimestampAt(Name path, Date otherwise) const
+Date XmlSection::TimestampAt(ElementPath path, Date otherwise) const
 {
     const Text text = TextAt(path);
     return IsSet(text) ? Converted(path, text, TimestampFrom) : otherwise;
 }
 
-bool XmlSection::Has(Name path) const { return static_cast<bool>(Find(path)); }
+bool XmlSection::Has(ElementPath path) const { return static_cast<bool>(Find(path)); }
 
-xml::NodeList XmlSection::NodesAt(Name path) const
+xml::NodeList XmlSection::NodesAt(ElementPath path) const
 {
-    const std::size_t slash = path.find('/');
-    return element.IsElement(path.substr(0, slash)) ? element.Select(path.substr(slash + 1)) : xml::NodeList();
+    return element && IsNamed(path.Group()) ? element.Select(path.Inner()) : xml::NodeList();
 }
 
-xml::Node XmlSection::FirstChildOf(Name path) const { return Find(path).FirstChild(); }
+xml::Node XmlSection::FirstChildOf(ElementPath path) const { return Find(path).FirstChild(); }
 
 xml::NodeList XmlSection::ElementsNamed(Name tagName) const
 {

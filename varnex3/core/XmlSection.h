@@ -8,6 +8,7 @@
 #include <cstdint>
 
 #include "varnex3/core/Date.h"
+#include "varnex3/core/ElementPath.h"
 #include "varnex3/core/Record.h"
 #include "varnex3/core/Text.h"
 #include "varnex3/xml/Document.h"
@@ -25,33 +26,33 @@ public:
     static void ReadText(T& record, TextView text);
 
     // Text of an element; absent gives "".
-    Text TextAt(Name path) const;
+    Text TextAt(ElementPath path) const;
     // Text of an element that must be there; an absent one raises ObjectNotSet.
-    Text RequiredTextAt(Name path) const;
+    Text RequiredTextAt(ElementPath path) const;
 
     // Number of an element; absent gives 0, text that is no number raises TypeMismatch, the empty text too.
-    double NumberAt(Name path) const;
-    std::int16_t Int16At(Name path) const;
-    std::int32_t Int32At(Name path) const;
+    double NumberAt(ElementPath path) const;
+    std::int16_t Int16At(ElementPath path) const;
+    std::int32_t Int32At(ElementPath path) const;
 
     // Whether there is such an element, whatever it holds.
-    bool Has(Name path) const;
+    bool Has(ElementPath path) const;
 
     // A time stamp: date and time of day, the zone dropped. Text that is no date raises TypeMismatch, and so does the
     // empty text of an element that is absent.
-    Date TimestampAt(Name path) const;
+    Date TimestampAt(ElementPath path) const;
     // The same, but the empty text, an absent element's too, gives what stands for it.
-    Date TimestampAt(Name path, Date otherwise) const;
+    Date TimestampAt(ElementPath path, Date otherwise) const;
 
     // A time stamp of an element that must be there: date and time of day, the zone dropped. Text that is no date
     // raises TypeMismatch.
-    Date RequiredTimestampAt(Name path) const;
+    Date RequiredTimestampAt(ElementPath path) const;
 
     // Every element that the path leads to, in document order.
-    xml::NodeList NodesAt(Name path) const;
+    xml::NodeList NodesAt(ElementPath path) const;
 
     // The first node inside an element, a text or a comment too; an absent one when there is none.
-    xml::Node FirstChildOf(Name path) const;
+    xml::Node FirstChildOf(ElementPath path) const;
 
     // Every element of this tag name in the section, at any depth, in document order.
     xml::NodeList ElementsNamed(Name tagName) const;
@@ -61,25 +62,37 @@ public:
 
     // Has a child record read the section at a path; an absent section is an empty document.
     template <class T, Ref<T> (*Make)()>
-    void ReadInto(const Child<T, Make>& child, Name path) const;
+    void ReadInto(const Child<T, Make>& child, ElementPath path) const;
 
     // The same, but no child is made to read an absent section, for records that an empty document leaves as they are
     // made: whether they read it or are made later is the same. Returns whether the section is there.
     template <class T, Ref<T> (*Make)()>
-    bool ReadIntoWhereUsed(const Child<T, Make>& child, Name path) const;
+    bool ReadIntoWhereUsed(const Child<T, Make>& child, ElementPath path) const;
 
     // Has a child record read a section that must be there; an absent one raises ObjectNotSet.
     template <class T>
-    void ReadRequiredInto(const Child<T>& child, Name path) const;
+    void ReadRequiredInto(const Child<T>& child, ElementPath path) const;
 
 private:
-    xml::Node Find(Name path) const;
-    xml::Node Require(Name path) const;
+    xml::Node Find(ElementPath path) const;
+    xml::Node Require(ElementPath path) const;
     template <class Convert>
-    auto Converted(Name path, TextView text, Convert convert) const;
+    auto Converted(ElementPath path, TextView text, Convert convert) const;
+
+    bool IsNamed(Name group) const;
+    const xml::ChildNames& Names() const;
+    xml::Node FindChild(ElementPath path) const;
 
     xml::Node element;
     Name reader;
+
+    // What was found out about the element: nearly every path begins alike, half of them lead to what is not there, and
+    // the others mostly to the element behind the one before.
+    mutable Name lastGroup;
+    mutable bool isLastGroup = false;
+    mutable bool hasNames = false;
+    mutable xml::ChildNames names;
+    mutable xml::Node lastFound;
 };
 
 template <class T>
@@ -91,19 +104,19 @@ void XmlSection::ReadText(T& record, TextView text)
 }
 
 template <class T, Ref<T> (*Make)()>
-void XmlSection::ReadInto(const Child<T, Make>& child, Name path) const
+void XmlSection::ReadInto(const Child<T, Make>& child, ElementPath path) const
 {
     child->Read(XmlSection(Find(path), T::ClassName));
 }
 
 template <class T>
-void XmlSection::ReadRequiredInto(const Child<T>& child, Name path) const
+void XmlSection::ReadRequiredInto(const Child<T>& child, ElementPath path) const
 {
     child->Read(XmlSection(Require(path), T::ClassName));
 }
 
 template <class T, Ref<T> (*Make)()>
-bool XmlSection::ReadIntoWhereUsed(const Child<T, Make>& child, Name path) const
+bool XmlSection::ReadIntoWhereUsed(const Child<T, Make>& child, ElementPath path) const
 {
     const xml::Node section = Find(path);
     if (section || child.IsMade())

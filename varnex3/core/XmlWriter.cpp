@@ -9,75 +9,61 @@
 
 namespace varnex3 {
 
-void XmlWriter::Put(TextView text)
-{
-    if (length < room.size())
-        std::copy_n(text.begin(), std::min(text.size(), room.size() - length),
-                    room.begin() + static_cast<std::ptrdiff_t>(length));
-    length += text.size();
-}
+namespace {
 
-void XmlWriter::Put(Name name)
-{
-    if (length < room.size())
-        std::copy_n(name.begin(), std::min(name.size(), room.size() - length),
-                    room.begin() + static_cast<std::ptrdiff_t>(length));
-    length += name.size();
-}
+constexpr TextView kLineEnd = u"\r\n";
 
-void XmlWriter::StartLine()
-{
-    for (int i = 0; i < level; ++i)
-        Put(TextView(u"\t"));
-}
+constexpr std::size_t LengthOf(char /*character*/) { return 1; }
+constexpr std::size_t LengthOf(Name name) { return name.size(); }
+constexpr std::size_t LengthOf(TextView text) { return text.size(); }
 
-void XmlWriter::PutStartTag(Name element)
+char16_t* Put(char16_t* to, char character)
 {
-    Put(TextView(u"<"));
-    Put(element);
-    Put(TextView(u">"));
+    *to = static_cast<char16_t>(character);
+    return to + 1;
 }
+char16_t* Put(char16_t* to, Name name) { return std::copy(name.begin(), name.end(), to); }
+char16_t* Put(char16_t* to, TextView text) { return std::copy(text.begin(), text.end(), to); }
 
-void XmlWriter::PutEndTag(Name element)
-{
-    Put(TextView(u"</"));
-    Put(element);
-    Put(TextView(u">"));
-}
+} // namespace
 
-void XmlWriter::Open(Name group)
+template <class... Part>
+void XmlWriter::PutLine(Part... parts)
 {
-    StartLine();
-    PutStartTag(group);
-    EndLine();
-    ++level;
-}
-
-void XmlWriter::Close(Name group)
-{
-    --level;
-    StartLine();
-    PutEndTag(group);
-    EndLine();
+    const auto tabs = static_cast<std::size_t>(level);
+    const std::size_t start = length;
+    length += tabs + (LengthOf(parts) + ...);
+    if (length > room.size())
+        return;
+    char16_t* to = std::fill_n(room.data() + start, tabs, u'\t');
+    ((to = Put(to, parts)), ...);
 }
 
 void XmlWriter::OpenMessage(Name root)
 {
-    Line(u"<?xml version=\"1.0\" encoding=\"UTF-8\"?>");
-    StartLine();
-    Put(TextView(u"<"));
-    Put(root);
-    Put(TextView(u" xmlns:xsi=\"http://www.w3.org/2001/XMLSchema-instance\" xsi:noNamespaceSchemaLocation=\""));
-    Put(root);
-    Put(TextView(u".xsd\">"));
-    EndLine();
+    PutLine(Name("<?xml version=\"1.0\" encoding=\"UTF-8\"?>"), kLineEnd);
+    PutLine('<', root,
+            Name(" xmlns:xsi=\"http://www.w3.org/2001/XMLSchema-instance\" xsi:noNamespaceSchemaLocation=\""), root,
+            Name(".xsd\">"), kLineEnd);
     ++level;
 }
 
 void XmlWriter::CloseMessageWithoutLineEnd(Name root)
 {
     --level;
-    PutEndTag(root);
+    PutLine(Name("</"), root, '>');
+}
+
+void XmlWriter::Open(Name group)
+{
+    PutLine('<', group, '>', kLineEnd);
+    ++level;
+}
+
+void XmlWriter::Close(Name group)
+{
+    --level;
+    PutLine(Name("</"), group, '>', kLineEnd);
 }
 
 XmlWriter::Mark XmlWriter::OpenUnlessEmpty(Name group)
@@ -97,17 +83,15 @@ void XmlWriter::CloseUnlessEmpty(const Mark& mark)
 
 void XmlWriter::Always(Name element, TextView value)
 {
-    StartLine();
-    PutStartTag(element);
-    Put(value);
-    PutEndTag(element);
-    EndLine();
+    PutLine('<', element, '>', value, Name("</"), element, '>', kLineEnd);
 }
 
 void XmlWriter::Always(Name element, Date value) { Always(element, TextView(FormatDate(value, 0))); }
 
 void XmlWriter::Always(Name element, double amount)
 {
+    if (NumberText text; text.PutAmount(amount))
+        return Always(element, text.View());
     try {
         Always(element, TextView(FormatAmount(amount)));
     } catch (const Error& error) {
@@ -115,7 +99,7 @@ void XmlWriter::Always(Name element, double amount)
     }
 }
 
-void XmlWriter::Always(Name element, std::int32_t value) { Always(element, TextView(ToText(Variant(value)))); }
+void XmlWriter::Always(Name element, std::int32_t value) { Always(element, NumberText(value).View()); }
 
 void XmlWriter::IfSet(Name element, TextView value)
 {
@@ -137,35 +121,15 @@ void XmlWriter::IfPositive(Name element, double amount)
 
 void XmlWriter::Flag(Name element, bool isSet)
 {
-    if (!isSet)
-        return;
-    StartLine();
-    Put(TextView(u"<"));
-    Put(element);
-    Put(TextView(u"/>"));
-    EndLine();
+    if (isSet)
+        PutLine('<', element, Name("/>"), kLineEnd);
 }
 
-void XmlWriter::Line(TextView text)
-{
-    StartLine();
-    Put(text);
-    EndLine();
-}
+void XmlWriter::Line(TextView text) { PutLine(text, kLineEnd); }
 
 void XmlWriter::AlwaysWithAttribute(Name element, Name attribute, TextView about, TextView value)
 {
-    StartLine();
-    Put(TextView(u"<"));
-    Put(element);
-    Put(TextView(u" "));
-    Put(attribute);
-    Put(TextView(u"=\""));
-    Put(about);
-    Put(TextView(u"\">"));
-    Put(value);
-    PutEndTag(element);
-    EndLine();
+    PutLine('<', element, ' ', attribute, Name("=\""), about, Name("\">"), value, Name("</"), element, '>', kLineEnd);
 }
 
 } // namespace varnex3

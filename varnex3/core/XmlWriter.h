@@ -79,14 +79,11 @@ private:
     // The record is the class whose Serialise raises what goes wrong here.
     XmlWriter(std::span<char16_t> room_, int level_, Name record_) : room(room_), level(level_), record(record_) {}
 
-    void StartLine();
-    void EndLine() { Put(TextView(u"\r\n")); }
-    void PutStartTag(Name element);
-    void PutEndTag(Name element);
-    void Put(TextView text);
-    void Put(Name name);
+    // One line at this level, its parts one after the other: names, texts and single characters.
+    template <class... Part>
+    void PutLine(Part... parts);
 
-    // Room for the text: what does not fit is counted only, so that the second time the room is exact.
+    // Room for the text: a line that does not fit is counted only, so that the second time the room is exact.
     std::span<char16_t> room;
     std::size_t length = 0;
     int level;
@@ -96,7 +93,7 @@ private:
 template <class T>
 Text XmlWriter::TextOf(const T& record)
 {
-    constexpr std::size_t kUsualRoom = 2048;
+    constexpr std::size_t kUsualRoom = 24 * 1024; // most messages, at once
     std::array<char16_t, kUsualRoom> usual; // NOLINT(cppcoreguidelines-pro-type-member-init): filled by the writer
     XmlWriter first(usual, T::kLevel, T::ClassName);
     record.Write(first);

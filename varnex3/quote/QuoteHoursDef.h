@@ -29,8 +29,8 @@ public:
     struct Element
     {
         Name name;
-        Name hours;
-        Name hourlyRate;
+        ElementPath hours;
+        ElementPath hourlyRate;
     };
 
 private:

@@ -309,6 +309,13 @@ Node Node::FirstChildElement(std::string_view name) const
     return child != noNode ? Node(document, child) : Node();
 }
 
+ChildNames Node::NamesOfChildren() const
+{
+    if (!document)
+        return {};
+    return document->content->Visit([this](const auto& tree) { return xml::NamesOfChildren(tree, index); });
+}
+
 std::size_t Node::AttributeCount() const
 {
     if (!document)

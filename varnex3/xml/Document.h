@@ -19,6 +19,7 @@
 #include <string_view>
 #include <vector>
 
+#include "varnex3/xml/NameSet.h"
 #include "varnex3/xml/ParseError.h"
 
 namespace varnex3::xml {
@@ -81,6 +82,9 @@ public:
     // The next element of this name from here on among the following siblings; absent when there is none.
     Node NextSiblingElement(std::string_view name) const;
     Node FirstChildElement(std::string_view name) const;
+
+    // Which names the elements directly inside may have.
+    ChildNames NamesOfChildren() const;
 
     // The number of attributes, namespace declarations not counted.
     std::size_t AttributeCount() const;

@@ -14,6 +14,8 @@ inline bool SameName(std::string_view name, std::string_view utf8) { return name
 
 inline bool SameName(std::u16string_view name, std::string_view utf8)
 {
+    if (name.size() > utf8.size()) // a unit takes a byte at least
+        return false;
     for (std::size_t i = 0; i < std::min(name.size(), utf8.size()); ++i) {
         if (Unit(utf8[i]) >= 0x80)
             return name.substr(i) == ToUtf16(utf8.substr(i));
@@ -70,6 +72,18 @@ template <class Char>
 bool IsNamed(const Tree<Char>& tree, NodeIndex at, std::string_view name)
 {
     return tree.IsElement(at) && SameName(tree.Name(at), name);
+}
+
+template <class Char>
+ChildNames NamesOfChildren(const Tree<Char>& tree, NodeIndex at)
+{
+    ChildNames names;
+    for (NodeIndex child = tree.FirstChild(at); child != noNode; child = tree.NextSibling(child)) {
+        const NameSet bit = tree.IsElement(child) ? NameSet{1} << NameBit(tree.Name(child)) : 0;
+        names.repeated |= names.all & bit;
+        names.all |= bit;
+    }
+    return names;
 }
 
 // The first element of a name among a node and its following siblings.

@@ -1,0 +1,32 @@
+// Sets of element names as one number: what is not in the set is not among the names; what is in it may be.
+#pragma once
+
+#include <cstddef>
+#include <cstdint>
+#include <string_view>
+
+namespace varnex3::xml {
+
+using NameSet = std::uint64_t;
+
+// The names of the elements inside a node.
+struct ChildNames
+{
+    NameSet all = 0;
+    NameSet repeated = 0; // the bits of more than one element: of a name without, there is one at most
+};
+
+constexpr bool Has(NameSet names, std::uint8_t bit) { return (names >> bit & 1) != 0; }
+
+// The bit of a name in a set. An ASCII name has the same one in every encoding.
+template <class Char>
+constexpr std::uint8_t NameBit(std::basic_string_view<Char> name)
+{
+    if (name.empty())
+        return 0;
+    const auto first = static_cast<std::size_t>(name.front());
+    const auto last = static_cast<std::size_t>(name.back());
+    return static_cast<std::uint8_t>((name.size() * 5 + first * 3 + last) % 64);
+}
+
+} // namespace varnex3::xml
