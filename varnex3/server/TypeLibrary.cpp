@@ -24,16 +24,16 @@ private:
 SRWLOCK heldLock = SRWLOCK_INIT;
 ITypeLib* held = nullptr;
 
-} // namespace
-
-HRESULT LoadTypeLibrary(ITypeLib** result) noexcept
+HRESULT Load() noexcept
 {
     try {
-        return LoadTypeLibEx(Module::Path().c_str(), REGKIND_NONE, result);
+        return LoadTypeLibEx(Module::Path().c_str(), REGKIND_NONE, &held);
     } catch (...) {
         return E_OUTOFMEMORY;
     }
 }
+
+} // namespace
 
 HRESULT FindTypeInfo(REFGUID id, ITypeInfo** result) noexcept
 {
@@ -41,7 +41,7 @@ HRESULT FindTypeInfo(REFGUID id, ITypeInfo** result) noexcept
         return E_POINTER;
     *result = nullptr;
     const Lock lock(heldLock);
-    const HRESULT status = held ? S_OK : LoadTypeLibrary(&held);
+    const HRESULT status = held ? S_OK : Load();
     return FAILED(status) ? status : held->GetTypeInfoOfGuid(id, result);
 }
 

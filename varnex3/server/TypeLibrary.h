@@ -10,9 +10,6 @@ namespace varnex3::server {
 // The description of a class or an interface. The library stays loaded for the next call.
 HRESULT FindTypeInfo(REFGUID id, ITypeInfo** result) noexcept;
 
-// The library itself, as it stands in the component's file.
-HRESULT LoadTypeLibrary(ITypeLib** result) noexcept;
-
 // Lets go of the library, before the component may be unloaded.
 void ReleaseTypeLibrary() noexcept;
 
