@@ -110,7 +110,8 @@ HRESULT UnregisterAll(Scope scope)
     RegisterOther(key, library, scope);
     if (deleted != ERROR_SUCCESS)
         return HRESULT_FROM_WIN32(deleted);
-    return unregistered == TYPE_E_REGISTRYACCESS ? S_OK : unregistered; // it was not registered
+    const bool wasThere = unregistered != TYPE_E_REGISTRYACCESS && unregistered != TYPE_E_LIBNOTREGISTERED;
+    return wasThere ? unregistered : S_OK;
 }
 
 template <class Action>
