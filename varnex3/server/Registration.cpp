@@ -99,6 +99,12 @@ void RegisterOther(const ClassesKey& key, const TypeLibraryFile& library, Scope 
         other.Register(scope);
 }
 
+// The ways in which systems say that there was no such library.
+bool IsNotRegistered(HRESULT status)
+{
+    return status == TYPE_E_REGISTRYACCESS || status == TYPE_E_LIBNOTREGISTERED || status == E_INVALIDARG;
+}
+
 HRESULT UnregisterAll(Scope scope)
 {
     const TypeLibraryFile library(Module::Path());
@@ -110,8 +116,7 @@ HRESULT UnregisterAll(Scope scope)
     RegisterOther(key, library, scope);
     if (deleted != ERROR_SUCCESS)
         return HRESULT_FROM_WIN32(deleted);
-    const bool wasThere = unregistered != TYPE_E_REGISTRYACCESS && unregistered != TYPE_E_LIBNOTREGISTERED;
-    return wasThere ? unregistered : S_OK;
+    return IsNotRegistered(unregistered) ? S_OK : unregistered;
 }
 
 template <class Action>
