@@ -1,11 +1,13 @@
 // How the types of the rows travel through a vtable: what a slot's function takes and gives in their place.
 //
-// | C++ type                    | in a slot |
-// |-----------------------------|--------------------------------------------------------------------------------------|
-// | numbers, enumerations       | as they are | | bool, Date                  | VARIANT_BOOL, DATE | | Text, TextView
-// | BSTR; a null one is the empty text                                                   | | Variant | VARIANT by value
-// | | Ref<C>                      | a pointer to the interface of C | | T&, T*, const ByReference<T>& | a pointer to
-// what T is; null is an omitted argument                                |
+// | C++ type                      | in a slot                                           |
+// |-------------------------------|-----------------------------------------------------|
+// | numbers, enumerations         | as they are                                         |
+// | bool, Date                    | VARIANT_BOOL, DATE                                  |
+// | Text, TextView                | BSTR; a null one is the empty text                  |
+// | Variant                       | VARIANT by value                                    |
+// | Ref<C>                        | a pointer to the interface of C                     |
+// | T&, T*, const ByReference<T>& | a pointer to what T is; null is an omitted argument |
 #pragma once
 
 #include "varnex3/core/Types.h"
