@@ -18,6 +18,9 @@ namespace varnex3 {
 class XmlWriter
 {
 public:
+    // Characters that are written at once; a longer text is measured before it is allocated. Most messages are shorter.
+    static constexpr std::size_t kUsualRoom = 24 * 1024;
+
     // The text of a record: what its Write writes, at the level of its class (T::kLevel).
     template <class T>
     static Text TextOf(const T& record);
@@ -71,6 +74,10 @@ public:
     template <class T, Ref<T> (*Make)()>
     void Append(const Child<T, Make>& child);
 
+    // What several children write, one behind the other.
+    template <class... Children>
+    requires(sizeof...(Children) > 1) void Append(const Children&... children) { (Append(children), ...); }
+
     // What a record writes that stands in a list.
     template <class T>
     void Append(const Ref<T>& item);
@@ -93,7 +100,6 @@ private:
 template <class T>
 Text XmlWriter::TextOf(const T& record)
 {
-    constexpr std::size_t kUsualRoom = 24 * 1024; // most messages, at once
     std::array<char16_t, kUsualRoom> usual; // NOLINT(cppcoreguidelines-pro-type-member-init): filled by the writer
     XmlWriter first(usual, T::kLevel, T::ClassName);
     record.Write(first);

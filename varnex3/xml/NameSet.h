@@ -18,7 +18,8 @@ struct ChildNames
 
 constexpr bool Has(NameSet names, std::uint8_t bit) { return (names >> bit & 1) != 0; }
 
-// The bit of a name in a set. An ASCII name has the same one in every encoding.
+// The bit of a name in a set, by factors that keep the names of the messages apart. An ASCII name has the same one in
+// every encoding.
 template <class Char>
 constexpr std::uint8_t NameBit(std::basic_string_view<Char> name)
 {
@@ -26,7 +27,7 @@ constexpr std::uint8_t NameBit(std::basic_string_view<Char> name)
         return 0;
     const auto first = static_cast<std::size_t>(name.front());
     const auto last = static_cast<std::size_t>(name.back());
-    return static_cast<std::uint8_t>((name.size() * 5 + first * 3 + last) % 64);
+    return static_cast<std::uint8_t>((name.size() * 9 + first * 25 + last * 30) % 64);
 }
 
 } // namespace varnex3::xml
