@@ -1,5 +1,5 @@
-// What reading a document and writing a record cost in memory, a line a job and size: job, items, bytes of the UTF-16
-// text, peak, allocations.
+// What reading a document, reading a quote into records and writing it cost in memory, a line a job and size: job,
+// items, bytes of the UTF-16 text, peak, allocations.
 //
 //     varnex3_bench_memory FOLDER
 //
@@ -8,7 +8,7 @@
 #include <string>
 
 #include "CountingHeap.h"
-#include "varnex3/core/InsurerOptDef.h"
+#include "varnex3/quote/Xalo_Quote.h"
 #include "varnex3/xml/Document.h"
 #include "varnex3/xml/Files.h"
 #include "varnex3/xml/Unicode.h"
@@ -35,15 +35,17 @@ bool MeasureLoading(const char* job, int items, std::size_t textBytes, Load load
     return isLoaded;
 }
 
-// A record that writes a line an item, and nothing whose form needs a text of its own.
-void MeasureWriting(int items)
+// A whole quote read, with all its records and texts, and then written.
+void MeasureRecords(int items, const Text& text)
 {
-    const auto insurer = New<InsurerOptDef>();
-    for (int i = 0; i < items; ++i)
-        insurer->InsurerDetail()->Add(u"Field " + xml::ToUtf16(std::to_string(i)), u"a value of the usual length");
     benchmarks::StartCounting();
-    const Text text = insurer->Serialise();
-    Print("serialise", items, text.size() * sizeof(char16_t), benchmarks::Counted());
+    const auto quote = New<Xalo_Quote>();
+    XmlSection::ReadText(*quote, text);
+    Print("read", items, text.size() * sizeof(char16_t), benchmarks::Counted());
+    quote->Serialise(); // makes the records that it finds missing
+    benchmarks::StartCounting();
+    const Text written = quote->Serialise();
+    Print("serialise", items, written.size() * sizeof(char16_t), benchmarks::Counted());
 }
 
 bool MeasureQuote(const std::string& folder, int items)
@@ -52,6 +54,7 @@ bool MeasureQuote(const std::string& folder, int items)
     const std::string bytes = xml::ReadFile(xml::ToUtf16(path));
     const std::u16string text = xml::ToUtf16(bytes);
     const std::size_t textBytes = text.size() * sizeof(char16_t);
+    MeasureRecords(items, text);
     return MeasureLoading("utf8", items, textBytes, [&](xml::Document& document) { return document.LoadBytes(bytes); })
            && MeasureLoading("utf16", items, textBytes,
                              [&](xml::Document& document) { return document.LoadText(text); });
@@ -79,7 +82,6 @@ int main(int argc, char** argv)
             std::cerr << "quote-" << items << ".xml was refused\n";
             return 2;
         }
-        MeasureWriting(items);
     }
     return 0;
 }

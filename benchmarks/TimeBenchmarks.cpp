@@ -2,7 +2,7 @@
 //
 //     varnex3_bench_time FOLDER [Google Benchmark's options]
 //
-// FOLDER holds quote-5.xml to quote-5000.xml, named by their number of items, and a folder inbox of messages.
+// FOLDER holds quote-5.xml to quote-10000.xml, named by their number of items, and a folder inbox of messages.
 #include <benchmark/benchmark.h>
 
 #include <iostream>
@@ -12,6 +12,7 @@
 
 #include "FolderReading.h"
 #include "Parsers.h"
+#include "QuoteBenchmarks.h"
 #include "varnex3/inbox/Xalo_Messages.h"
 #include "varnex3/xml/Files.h"
 #include "varnex3/xml/Unicode.h"
@@ -81,8 +82,13 @@ int main(int argc, char** argv)
     }
     KeepMemory();
     const std::string folder = argv[1];
-    for (const int items : {5, 50, 500, 5000})
+    for (const int items : {5, 50, 500, 5000}) {
         RegisterParsers(folder, items);
+        RegisterQuote(folder, items);
+    }
+    for (const int items : {1000, 10000})
+        RegisterGrowth(folder, items);
+    RegisterMaking();
     RegisterInbox(folder + "/inbox");
     benchmark::RunSpecifiedBenchmarks();
     return 0;
