@@ -4,8 +4,8 @@
 #include <sys/stat.h>
 #include <unistd.h>
 
-#include "Documents.h"
 #include "tests/TemporaryFolder.h"
+#include "tests/xml/Documents.h"
 #include "tests/xml/SystemErrors.h"
 #include "varnex3/xml/Files.h"
 
