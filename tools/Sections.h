@@ -17,6 +17,17 @@ struct Section
     std::optional<Error> error; // why the class could not read all of it
 };
 
+// A value that a message has beside its sections, as the file has it.
+struct OwnValue
+{
+    Name element;
+    Text text;
+    std::optional<Error> error; // why the message's class could not read it
+};
+
+// Those that a quote has; the reason of an inspection, which no class reads, too. Other messages have none.
+std::vector<OwnValue> ReadOwnValues(const xml::Document& document);
+
 // Those sections below the root element that there is a class for, in the order in which messages have them.
 std::vector<Section> ReadSections(const xml::Document& document);
 

@@ -6,11 +6,13 @@
 
 #include "DisplayText.h"
 #include "MessageFile.h"
+#include "MessagePage.h"
 #include "RecordTree.h"
 #include "Sections.h"
 #include "SourceExcerpt.h"
 #include "Summary.h"
 #include "varnex3/core/Json.h"
+#include "varnex3/quote/VarnexStatusDef.h"
 #include "varnex3/xml/Files.h"
 
 namespace varnex3::tool {
@@ -31,12 +33,31 @@ void PrintFault(Terminal& terminal, const MessageFile& file, std::string_view by
     terminal.Line(gutter + std::string(excerpt.caret, ' ') + terminal.Styled(Style::Bad, "^"));
 }
 
-void PrintSummary(Terminal& terminal, MessageDef& message)
+// A property of the summary; a status in words, with its code.
+Text InWords(MessageDef& message, Name property)
+{
+    const Text value = ValueOf(message, property);
+    const auto status = New<VarnexStatusDef>();
+    if (property == "VarnexStatusCode")
+        status->Status(value);
+    const Text words = status->StatusTypeText();
+    return words.empty() ? value : words + u" (" + value + u")";
+}
+
+enum class Extent
+{
+    Whole,
+    Head // what the message is, not what it says
+};
+
+void PrintSummary(Terminal& terminal, MessageDef& message, Extent extent)
 {
     PrintField(terminal, 0, "File", Printable(message.FileName()));
-    for (const SummaryField& field : SummaryFields())
-        if (const Text value = ValueOf(message, field.property); !value.empty())
+    for (const SummaryField& field : SummaryFields()) {
+        const Text value = InWords(message, field.property);
+        if (!value.empty() && (field.isHead || extent == Extent::Whole))
             PrintField(terminal, 0, field.label, Printable(value));
+    }
 }
 
 void PrintSection(Terminal& terminal, const Section& section)
@@ -65,6 +86,15 @@ Json JsonOf(const std::vector<Section>& sections)
     return json;
 }
 
+void AddOwnValues(Json& json, const std::vector<OwnValue>& values)
+{
+    for (const OwnValue& value : values) {
+        json[std::string(value.element)] = ToUtf8(value.text);
+        if (value.error)
+            json["error"] = JsonOf(*value.error);
+    }
+}
+
 std::string ReadBytes(const Text& path)
 {
     try {
@@ -85,21 +115,26 @@ Status Show(const ShowOptions& options, const Console& console)
     xml::Document document;
     document.LoadBytes(bytes);
     const std::vector<Section> sections = ReadSections(document);
+    const std::vector<OwnValue> values = ReadOwnValues(document);
     const MessageFile file(std::move(document), FileNameIn(path), path);
 
     if (options.isJson) {
         Json json = tool::JsonOf(file);
+        AddOwnValues(json, values);
         json["sections"] = JsonOf(sections);
         console.out.Line(JsonLine(json));
     } else if (file.IsBroken()) {
         PrintFault(console.out, file, bytes);
+    } else if (HasPage(*file.message)) {
+        PrintSummary(console.out, *file.message, Extent::Head);
+        PrintPage(console.out, values, sections);
     } else {
-        PrintSummary(console.out, *file.message);
+        PrintSummary(console.out, *file.message, Extent::Whole);
         for (const Section& section : sections)
             PrintSection(console.out, section);
     }
-    const bool isRead =
-        std::ranges::none_of(sections, [](const Section& section) { return section.error.has_value(); });
+    const auto hasError = [](const auto& part) { return part.error.has_value(); };
+    const bool isRead = std::ranges::none_of(sections, hasError) && std::ranges::none_of(values, hasError);
     return file.IsFine() && isRead ? Status::Fine : Status::Findings;
 }
 

@@ -7,10 +7,18 @@ namespace varnex3::tool {
 std::span<const SummaryField> SummaryFields()
 {
     static constexpr SummaryField fields[] = {
-        {"Type", "MessageDescription"}, {"Root element", "MessageType"},  {"Message no", "MessageNo"},
-        {"Quote no", "QuoteNo"},        {"Status", "VarnexStatusCode"},   {"Image no", "ImageNo"},
-        {"Claim", "ClaimNo"},           {"Registration", "Registration"}, {"Vehicle", "VehicleDesciption"},
-        {"Vehicle ID", "VehicleID"},    {"Customer", "Customer"},         {"Repairer ID", "RepairerID"},
+        {"Type", "MessageDescription", true},
+        {"Root element", "MessageType"},
+        {"Message no", "MessageNo", true},
+        {"Quote no", "QuoteNo", true},
+        {"Status", "VarnexStatusCode", true},
+        {"Image no", "ImageNo"},
+        {"Claim", "ClaimNo"},
+        {"Registration", "Registration"},
+        {"Vehicle", "VehicleDesciption"},
+        {"Vehicle ID", "VehicleID"},
+        {"Customer", "Customer"},
+        {"Repairer ID", "RepairerID"},
     };
     return fields;
 }

@@ -11,7 +11,8 @@ namespace varnex3::tool {
 struct SummaryField
 {
     Name label;
-    Name property; // of MessageDef
+    Name property;       // of MessageDef
+    bool isHead = false; // tells what the message is, not what it says
 };
 
 // In the order in which a person reads them.
