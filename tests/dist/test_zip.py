@@ -135,10 +135,13 @@ class Zip(unittest.TestCase):
                 printed = self.script(bits, r"samples\windows\record.js")
                 self.assertEqual(plain(printed), without_source)
 
-    def test_a_folder_that_is_not_there_is_told_with_number_and_words(self) -> None:
+    def test_the_session_in_the_documents_is_what_scripts_print(self) -> None:
         self.registered()
-        printed = self.script("win64", r"samples\windows\inbox.vbs", "nowhere")
-        self.assertEqual(printed, "0 messages\nError 30030: Folder 'nowhere' does not exist.\n")
+        text = (SOURCE / "docs/automation.md").read_text()
+        session = re.findall(r"^> cscript //nologo (.*)\n([^`]*)```", text, re.MULTILINE)
+        self.assertEqual(len(session), 3)
+        for words, shown in session:
+            self.assertEqual(plain(self.script("win64", *words.split())), shown)
 
     def test_registered_the_early_bound_samples_print_what_they_should(self) -> None:
         self.registered()
