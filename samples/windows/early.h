@@ -28,7 +28,8 @@ private:
 inline std::ostream& operator<<(std::ostream& stream, const Text& text)
 {
     const int size = static_cast<int>(SysStringLen(text));
-    std::string narrow(static_cast<std::size_t>(WideCharToMultiByte(CP_ACP, 0, text, size, nullptr, 0, nullptr, nullptr)), ' ');
+    std::string narrow(
+        static_cast<std::size_t>(WideCharToMultiByte(CP_ACP, 0, text, size, nullptr, 0, nullptr, nullptr)), ' ');
     WideCharToMultiByte(CP_ACP, 0, text, size, &narrow[0], static_cast<int>(narrow.size()), nullptr, nullptr);
     return stream << narrow;
 }
@@ -70,7 +71,8 @@ inline void Check(HRESULT status)
 template <class Interface>
 Object<Interface>::Object(REFCLSID kind)
 {
-    Check(CoCreateInstance(kind, nullptr, CLSCTX_INPROC_SERVER, __uuidof(Interface), reinterpret_cast<void**>(&object)));
+    Check(
+        CoCreateInstance(kind, nullptr, CLSCTX_INPROC_SERVER, __uuidof(Interface), reinterpret_cast<void**>(&object)));
 }
 
 inline void Print(const Failure& failure)
