@@ -5,6 +5,7 @@ from __future__ import annotations
 import ctypes
 import os
 import pathlib
+import sys
 from ctypes import POINTER, byref, c_char, c_char_p, c_double, c_int32, c_size_t, c_void_p
 from typing import Any
 
@@ -77,9 +78,11 @@ class Error(Exception):
 
 def _load() -> ctypes.CDLL:
     """The shared library: the one VARNEX3_LIBRARY names, the one beside this file, or the system's."""
-    beside = pathlib.Path(__file__).with_name("libvarnex3_c.so")
-    path = os.environ.get("VARNEX3_LIBRARY") or (str(beside) if beside.exists() else "libvarnex3_c.so.3")
-    return ctypes.CDLL(path)
+    name, installed = "libvarnex3_c.so", "libvarnex3_c.so.3"
+    if sys.platform == "win32":
+        name = installed = "Varnex3.dll"  # the component has the C face, too
+    beside = pathlib.Path(__file__).with_name(name)
+    return ctypes.CDLL(os.environ.get("VARNEX3_LIBRARY") or (str(beside) if beside.exists() else installed))
 
 
 def _declare(library: ctypes.CDLL) -> None:
