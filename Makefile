@@ -24,6 +24,7 @@ demo: setup build ## build what is missing, summarise the sample inbox, show the
 	@echo; $(BUILD)/tools/varnex3 doctor; test $$? -le 1
 
 test: setup build windows ## build and run every test, those of the component under Wine
+	@scripts/setup samples
 	@scripts/run_tests $(BUILD) build/win32 build/win64
 
 sanitize: setup ## build with the address and undefined-behaviour sanitizers and run every test
