@@ -1,44 +1,16 @@
 // What is written reads back to the same text: generated messages, and every deliberate loss by itself.
-#include <string>
-
-#include "tests/Printing.h"
-#include "tests/RecordGenerator.h"
+#include "tests/RoundTrip.h"
 #include "varnex3/quote/Xalo_Quote.h"
 #include "varnex3/request/Xalo_RequestForQuote.h"
 
 using namespace varnex3;
+using tests::CheckRoundTrips;
 using tests::RaisedBy;
 using tests::RecordGenerator;
+using tests::SomeOf;
+using tests::Trip;
 
 namespace {
-
-constexpr int kMessages = 10000;
-
-template <class Message>
-Text WrittenAgain(const Text& text)
-{
-    return ToText(New<Message>()->ParseXML(text));
-}
-
-// The first line in which two texts differ, as both have it.
-std::string Difference(TextView a, TextView b)
-{
-    std::size_t start = 0;
-    for (std::size_t i = 0; i < a.size() && i < b.size() && a[i] == b[i]; ++i)
-        if (a[i] == u'\n')
-            start = i + 1;
-    const auto line = [&](TextView text) { return text.substr(start, text.find(u'\n', start) - start); };
-    return tests::Visible(line(a)) + " came back as " + tests::Visible(line(b));
-}
-
-template <class Message>
-void CheckRoundTrip(const Message& message)
-{
-    const Text first = message.Serialise();
-    const Text second = WrittenAgain<Message>(first);
-    if (first != second)
-        FAIL(Difference(first, second));
-}
 
 // What every message must have to be read at all.
 template <class Message>
@@ -113,23 +85,13 @@ Ref<Xalo_Quote> SmallestQuote()
     return quote;
 }
 
-// The text of the quote after a change, and what that text becomes when it is read and written again.
-struct Trip
-{
-    Text first;
-    Text second;
-
-    bool Keeps(TextView line) const { return first.find(line) != Text::npos && second.find(line) != Text::npos; }
-    bool Loses(TextView line) const { return first.find(line) != Text::npos && second.find(line) == Text::npos; }
-};
-
+// Of the smallest quote after a change.
 template <class Change>
 Trip TripOf(Change change)
 {
     const auto quote = SmallestQuote();
     change(*quote);
-    const Text first = quote->Serialise();
-    return {first, WrittenAgain<Xalo_Quote>(first)};
+    return tests::TripOf(*quote);
 }
 
 template <class Change>
@@ -142,25 +104,17 @@ Trip TripOfItem(Change change)
 
 TEST_CASE("Quote: ten thousand generated quotes are read and written again as the same text")
 {
-    for (unsigned seed = 0; seed < kMessages; ++seed) {
-        CAPTURE(seed);
-        CheckRoundTrip(*Generated<Xalo_Quote>(seed));
-    }
+    CheckRoundTrips(Generated<Xalo_Quote>);
 }
 
 TEST_CASE("Request: ten thousand generated requests are read and written again as the same text")
 {
-    for (unsigned seed = 0; seed < kMessages; ++seed) {
-        CAPTURE(seed);
-        CheckRoundTrip(*Generated<Xalo_RequestForQuote>(seed));
-    }
+    CheckRoundTrips(Generated<Xalo_RequestForQuote>);
 }
 
 TEST_CASE("Generator: among the generated quotes every kind of item and every optional line comes up")
 {
-    Text all;
-    for (unsigned seed = 0; seed < 200; ++seed)
-        all += Generated<Xalo_Quote>(seed)->Serialise();
+    const Text all = SomeOf(Generated<Xalo_Quote>);
     for (const TextView element : {u"QuoteNo",
                                    u"QuoteDate",
                                    u"VarnexStatus",
