@@ -53,11 +53,16 @@ using QuoteClasses = ClassList<
     QuoteItemsDef, QuoteItem, QuoteHoursDef, QuoteItemPaintLabour, QuoteItemPaintMaterials, QuoteItemPart,
     QuoteItemPartPartSource, QuoteItemMiscellaneous, QuoteItemMiscellaneousSublet, QuoteItemTowing, PartNumberDef>;
 
+using OutcomeClasses = ClassList<
+    // invoices
+    Xalo_TaxInvoice, Xalo_AdjustmentNote, Xalo_ReactivateInvoice, TaxInvoiceDetailsDef, AdjustmentNoteDetailsDef,
+    PaymentDetailsDef>;
+
 using NoticesClasses = ClassList<VarnexReferenceDataEnum>;
 
 using InboxClasses = ClassList<MessageDef, Xalo_Messages>;
 
-using ClassFolders = Folders<CoreClasses, RequestClasses, QuoteClasses, NoticesClasses, InboxClasses>;
+using ClassFolders = Folders<CoreClasses, RequestClasses, QuoteClasses, OutcomeClasses, NoticesClasses, InboxClasses>;
 
 using PublicClasses = JoinedLists<ModuleList, ClassFolders>::List;
 

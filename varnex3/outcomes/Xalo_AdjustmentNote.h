@@ -1,0 +1,41 @@
+// The message with which a repairer corrects an invoice.
+#pragma once
+
+#include "varnex3/core/ClaimHeaderDef.h"
+#include "varnex3/core/DestinationDef.h"
+#include "varnex3/core/InsurerOptDef.h"
+#include "varnex3/core/RepairerDef.h"
+#include "varnex3/core/SourceDef.h"
+#include "varnex3/core/VehicleDef.h"
+#include "varnex3/core/VersionDef.h"
+#include "varnex3/outcomes/AdjustmentNoteDetailsDef.h"
+#include "varnex3/outcomes/PaymentDetailsDef.h"
+
+namespace varnex3 {
+
+class Xalo_AdjustmentNote final : public Record
+{
+    VARNEX_RECORD(Xalo_AdjustmentNote, "A repairer's adjustment note, the whole message. It can be written only.");
+    VARNEX_SERIALISE("The message, from the XML declaration to the root's end tag and the line end behind it.");
+    VARNEX_PROPERTY(Child<VersionDef>, objVersionField, VersionField, "Version of the message language.");
+    VARNEX_PROPERTY(Child<SourceDef>, objSourceField, SourceField, "Who sent the message, and when.");
+    VARNEX_PROPERTY(Child<DestinationDef>, objDestinationField, DestinationField, "Whom it is sent to.");
+    VARNEX_PROPERTY(Text, sMessageNoField, MessageNoField, "Number of the message; written as it is when not empty.");
+    VARNEX_PROPERTY(Child<InsurerOptDef>, objInsurerField, InsurerField, "The insurer.");
+    VARNEX_PROPERTY(Child<RepairerDef>, objRepairerField, RepairerField, "The repairer.");
+    VARNEX_PROPERTY(Child<ClaimHeaderDef>, objClaimHeaderField, ClaimHeaderField,
+                    "Claim and vehicle by their numbers.");
+    VARNEX_PROPERTY(Text, sQuoteNoField, QuoteNoField, "Number of the quote; written as it is when not empty.");
+    VARNEX_PROPERTY(Child<VehicleDef>, objVehicleField, VehicleField, "The vehicle.");
+    VARNEX_PROPERTY(Child<AdjustmentNoteDetailsDef>, objAdjustmentNoteDetailsField, AdjustmentNoteDetailsField,
+                    "What is adjusted, and by how much.");
+    VARNEX_PROPERTY(Child<PaymentDetailsDef>, objPaymentDetailsField, PaymentDetailsField,
+                    "The figures of the invoice.");
+    VARNEX_PROPERTY(Text, sOpenTextField, OpenTextField,
+                    "Free text; written as it is when not empty. Its end tag is OpenTextField, so that a note with it "
+                    "is not well-formed.");
+    static constexpr int kLevel = 0;
+    VARNEX_RECORD_END;
+};
+
+} // namespace varnex3
