@@ -56,7 +56,9 @@ using QuoteClasses = ClassList<
 using OutcomeClasses = ClassList<
     // invoices
     Xalo_TaxInvoice, Xalo_AdjustmentNote, Xalo_ReactivateInvoice, TaxInvoiceDetailsDef, AdjustmentNoteDetailsDef,
-    PaymentDetailsDef>;
+    PaymentDetailsDef,
+    // what comes of payment
+    Xalo_PaymentAuthorised, Xalo_PaymentDeclined, PayAuthorityDetailsDef, ExpectedPaymentDetailsDef>;
 
 using NoticesClasses = ClassList<VarnexReferenceDataEnum>;
 
