@@ -58,7 +58,9 @@ using OutcomeClasses = ClassList<
     Xalo_TaxInvoice, Xalo_AdjustmentNote, Xalo_ReactivateInvoice, TaxInvoiceDetailsDef, AdjustmentNoteDetailsDef,
     PaymentDetailsDef,
     // what comes of payment
-    Xalo_PaymentAuthorised, Xalo_PaymentDeclined, PayAuthorityDetailsDef, ExpectedPaymentDetailsDef>;
+    Xalo_PaymentAuthorised, Xalo_PaymentDeclined, PayAuthorityDetailsDef, ExpectedPaymentDetailsDef,
+    // what else ends a job
+    Xalo_Declined, DeclinedDetailDef, Xalo_JobCancelled>;
 
 using NoticesClasses = ClassList<VarnexReferenceDataEnum>;
 
