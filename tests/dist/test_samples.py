@@ -31,6 +31,15 @@ class Samples(unittest.TestCase):
     def check(self, sample: str, printed: str) -> None:
         self.assertEqual(printed, (SOURCE / f"tests/dist/expected/{sample}.txt").read_text())
 
+    def check_file(self, name: str) -> None:
+        self.assertEqual((self.folder / name).read_bytes(), (SOURCE / f"tests/dist/expected/{name}").read_bytes())
+
+    def compile(self, sample: str) -> pathlib.Path:
+        words = ["-std=c++20", "-Wall", "-Wextra", "-Werror", "-I", SOURCE, f"samples/cpp/{sample}.cpp"]
+        program = self.folder / sample
+        self.assertEqual(run("g++", *words, BINARY / "varnex3/libvarnex3.a", "-o", program), "")
+        return program
+
     def test_the_python_samples_print_what_they_should(self) -> None:
         for sample in ("inbox", "record"):
             with self.subTest(sample):
@@ -39,10 +48,22 @@ class Samples(unittest.TestCase):
     def test_the_cpp_samples_print_what_they_should(self) -> None:
         for sample in ("inbox", "record"):
             with self.subTest(sample):
-                words = ["-std=c++20", "-Wall", "-Wextra", "-Werror", "-I", SOURCE, f"samples/cpp/{sample}.cpp"]
-                program = self.folder / sample
-                self.assertEqual(run("g++", *words, BINARY / "varnex3/libvarnex3.a", "-o", program), "")
-                self.check(sample, run(program))
+                self.check(sample, run(self.compile(sample)))
+
+    def check_answer(self, *sample: object) -> None:
+        """The answer to a request: what is printed, and the quote to the byte."""
+        request, quote = SOURCE / "samples/messages/request.xml", self.folder / "answer_request.xml"
+        self.check("answer_request", run(*sample, request, quote))
+        self.check_file("answer_request.xml")
+
+    def test_the_cpp_sample_answers_a_request(self) -> None:
+        program = self.compile("answer_request")
+        self.check_answer(program)
+        self.assertIn("file", run(program, self.folder / "none.xml", self.folder / "quote.xml"))
+        self.assertFalse((self.folder / "quote.xml").exists())
+
+    def test_the_python_sample_answers_a_request(self) -> None:
+        self.check_answer(sys.executable, "-B", SOURCE / "samples/python/answer_request.py")
 
     @unittest.skipUnless(shutil.which("mcs"), "no compiler for C# is installed (scripts/setup samples)")
     def test_the_csharp_samples_compile(self) -> None:
