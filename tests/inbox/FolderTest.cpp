@@ -2,6 +2,7 @@
 #include "tests/Printing.h"
 #include "tests/TemporaryFolder.h"
 #include "tests/inbox/Scans.h"
+#include "varnex3/inbox/InboxFolder.h"
 
 using namespace varnex3;
 using tests::RaisedBy;
@@ -67,6 +68,27 @@ TEST_CASE("A zero in a path is never cut off at: saveToFile writes no file of an
     CHECK(fs::is_empty(folder.Path()));
 }
 
+TEST_CASE("A file that vanishes after it was listed is 53")
+{
+    const TemporaryFolder folder;
+    folder.Write("a.xml", "<Foo/>");
+    InboxFolder inbox(folder.Name());
+    CHECK(inbox.FileNames() == std::vector<Text>{u"a.xml"});
+    fs::remove(folder.Path("a.xml"));
+    xml::Document document;
+    CHECK(RaisedBy([&] { inbox.Load(u"a.xml", document); }) == "53 Xalo_Messages.ParseFiles");
+}
+
+TEST_CASE("A folder may be listed again, and then has what is in it then")
+{
+    const TemporaryFolder folder;
+    folder.Write("a.xml", "");
+    const InboxFolder inbox(folder.Name());
+    CHECK(inbox.FileNames().size() == 1);
+    folder.Write("b.xml", "");
+    CHECK(inbox.FileNames().size() == 2);
+}
+
 TEST_CASE("A file of 2 GB is no trouble for the files after it")
 {
     const TemporaryFolder inbox;
@@ -75,8 +97,13 @@ TEST_CASE("A file of 2 GB is no trouble for the files after it")
     fs::resize_file(inbox.Path("b.xml"), std::uintmax_t{1} << 31); // a hole: nothing is written
     inbox.Write("c.xml", "<Foo/>");
     const auto messages = New<Xalo_Messages>();
+    if constexpr (sizeof(void*) < 8) { // more than such a program can hold: out of memory
+        CHECK(Scan(*messages, inbox.Name()) == "7");
+        CHECK(messages->Count() == 1);
+        return;
+    }
     CHECK(Scan(*messages, inbox.Name()) == "fine");
-    CHECK(messages->Count() == 3);
+    REQUIRE(messages->Count() == 3);
     CHECK(messages->MessageItems(std::int32_t{1})->ParseError());
     CHECK(messages->MessageItems(std::int32_t{2})->FileName() == u"c.xml");
 }

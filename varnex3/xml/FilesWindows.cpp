@@ -80,6 +80,14 @@ void CheckFile(bool isDone, const Path& path)
     ThrowSystemError(IsFolderPath(path) ? EISDIR : ErrorNumberOf(reason), NativePath(path));
 }
 
+// Not every system that runs programs for Windows keeps such a file from being replaced.
+void CheckWritable(const Path& path)
+{
+    const DWORD attributes = AttributesOf(path);
+    if (attributes != INVALID_FILE_ATTRIBUTES && (attributes & FILE_ATTRIBUTE_READONLY) != 0 && !IsFolderPath(path))
+        ThrowSystemError(EACCES, NativePath(path));
+}
+
 HANDLE OpenForReading(const Path& path)
 {
     constexpr DWORD everything = FILE_SHARE_READ | FILE_SHARE_WRITE | FILE_SHARE_DELETE;
@@ -232,7 +240,9 @@ std::size_t InputFile::Read(char* to, std::size_t count)
 
 void WriteFileAtomically(std::u16string_view path, std::string_view bytes)
 {
-    TemporaryFile temporary(CheckedPath(path));
+    const Path target = CheckedPath(path);
+    CheckWritable(target);
+    TemporaryFile temporary(target);
     temporary.Write(bytes);
     temporary.TakeTargetsPlace();
 }
