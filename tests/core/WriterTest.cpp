@@ -187,6 +187,17 @@ TEST_CASE("XmlWriter: a child stands at its own class's level, whatever stands a
            u"\t<A></A>\r\n</Root>\r\n");
 }
 
+TEST_CASE("XmlWriter: several children are written one behind the other, in the order in which they are named")
+{
+    const Child<PersonalNameDef> name;
+    name->Surname(u"S");
+    const Child<CustomerDef> nobody; // writes nothing
+    const Child<ClaimHeaderDef> claim;
+    claim->VehicleID(u"V");
+    CHECK(TextOf<0>([&](XmlWriter& xml) { xml.Append(name, nobody, claim); })
+          == name->Serialise() + claim->Serialise());
+}
+
 TEST_CASE("XmlWriter: Writes tells whether a child would write anything")
 {
     Child<PersonalNameDef> name;
