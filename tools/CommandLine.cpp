@@ -5,9 +5,11 @@
 #include <string>
 #include <vector>
 
+#include "ConvertCommand.h"
 #include "DisplayText.h"
 #include "DoctorCommand.h"
 #include "IdentifyCommand.h"
+#include "NewCommand.h"
 #include "ScanCommand.h"
 #include "ScanReport.h"
 #include "SettingsCommand.h"
@@ -37,6 +39,16 @@ constexpr const char* kShowExamples = R"(Examples:
   varnex3 show inbox/job-4711-2-quote.xml
   varnex3 show broken.xml
   varnex3 show --json quote.xml | jq .sections.Vehicle)";
+
+constexpr const char* kConvertExamples = R"(Examples:
+  varnex3 convert quote.xml -o quote.json
+  varnex3 convert quote.json -o quote.xml
+  varnex3 convert quote.xml | jq .Xalo_Quote.TotalsField)";
+
+constexpr const char* kNewExamples = R"(Examples:
+  varnex3 new Quote
+  varnex3 new TaxInvoice -o invoice.xml
+  varnex3 new RequestForQuote --to json)";
 
 constexpr const char* kSettingsExamples = R"(Examples:
   varnex3 settings list corvo32
@@ -80,6 +92,8 @@ public:
         AddScan();
         AddIdentify();
         AddShow();
+        AddConvert();
+        AddNew();
         AddSettings();
         AddDoctor();
     }
@@ -112,13 +126,31 @@ private:
         return command;
     }
 
-    // What every command has: the option for JSON, and an action.
+    template <class Options, class Action>
+    void SetAction(CLI::App* command, Options& options, Action action)
+    {
+        command->callback(
+            [this, &options, action] { chosen = [this, &options, action] { return action(options, console); }; });
+    }
+
+    // What every command has that tells something: the option for JSON, and an action.
     template <class Options, class Action>
     void Finish(CLI::App* command, Options& options, Action action)
     {
         command->add_flag("--json", options.isJson, kJsonHelp);
-        command->callback(
-            [this, &options, action] { chosen = [this, &options, action] { return action(options, console); }; });
+        SetAction(command, options, action);
+    }
+
+    // What every command has that writes a message: in which form, where to, and an action.
+    template <class Options, class Action>
+    void FinishMessage(CLI::App* command, Options& options, const char* formHelp, Action action)
+    {
+        command->add_option("--to", options.to, formHelp)
+            ->check(CLI::IsMember({"json", "xml"}).description(""))
+            ->type_name("FORM");
+        command->add_option("-o", options.output, "The file to write; the standard output without it")
+            ->type_name("FILE");
+        SetAction(command, options, action);
     }
 
     void AddScan()
@@ -147,6 +179,20 @@ private:
         CLI::App* const command = AddCommand("show", "Show what a message says, or where it is broken", kShowExamples);
         command->add_option("FILE", show.file, "The message")->required()->type_name("");
         Finish(command, show, Show);
+    }
+
+    void AddConvert()
+    {
+        CLI::App* const command = AddCommand("convert", "Convert a message to JSON, or back to XML", kConvertExamples);
+        command->add_option("FILE", convert.file, "The message, as XML or as JSON")->required()->type_name("");
+        FinishMessage(command, convert, "json or xml; without it, what the file is not", Convert);
+    }
+
+    void AddNew()
+    {
+        CLI::App* const command = AddCommand("new", "Write an example of a message", kNewExamples);
+        command->add_option("TYPE", newMessage.type, "The type, such as Quote")->required()->type_name("");
+        FinishMessage(command, newMessage, "json or xml; xml without it", NewMessage);
     }
 
     void AddSettings()
@@ -199,6 +245,8 @@ private:
     ScanOptions scan;
     IdentifyOptions identify;
     ShowOptions show;
+    ConvertOptions convert;
+    NewOptions newMessage;
     SettingsOptions settings;
     DoctorOptions doctor;
     std::function<Status()> chosen;
