@@ -98,6 +98,24 @@ TEST_CASE("FirstAttributeOf: the first one written, namespace declarations not c
     CHECK(RaisedBy([&] { a->FirstAttributeOf(found[1]); }) == "91 ReaderDef.ParseXML");
 }
 
+TEST_CASE("RequiredFirstAttributeAt: an element without an attribute and one that is missing are told apart")
+{
+    const TextSection a(u"<A z=\"1\" y=\"2\"><B c=\"3\"/><D/></A>");
+    CHECK(a->RequiredFirstAttributeAt("A") == u"1");
+    CHECK(a->RequiredFirstAttributeAt("A/B") == u"3");
+    const auto description = [](const auto& read) {
+        try {
+            read();
+        } catch (const Error& error) {
+            return error.Source() + u": " + error.Description();
+        }
+        return Text();
+    };
+    CHECK(description([&] { a->RequiredFirstAttributeAt("A/D"); })
+          == u"ReaderDef.ParseXML: the element D has no attribute");
+    CHECK(description([&] { a->RequiredFirstAttributeAt("X"); }) == u"ReaderDef.ParseXML: the element X is missing");
+}
+
 TEST_CASE("A section that a child reads in place reads as its own text loaded again")
 {
     // Pieces that make the difference, if there is one: white space, xml:space, prefixes, comments, CDATA, references.

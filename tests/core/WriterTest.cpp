@@ -116,6 +116,18 @@ TEST_CASE("XmlWriter: a line with an attribute is written whatever the values, a
           == u"\t<A FieldName=\"\"></A>\r\n");
 }
 
+TEST_CASE("XmlWriter: a group with an attribute opens whatever the value, which is not escaped")
+{
+    CHECK(TextOf([](XmlWriter& xml) {
+              xml.OpenWithAttribute("A", "Name", u"B\"<");
+              xml.Always("C", u"x");
+              xml.Close("A");
+              xml.OpenWithAttribute("D", "Name", u"");
+              xml.Close("D");
+          })
+          == u"\t<A Name=\"B\"<\">\r\n\t\t<C>x</C>\r\n\t</A>\r\n\t<D Name=\"\">\r\n\t</D>\r\n");
+}
+
 TEST_CASE("XmlWriter: a group that nothing is written inside is taken back")
 {
     const auto group = [](XmlWriter& xml, TextView inside) {

@@ -392,7 +392,7 @@ public:                                                                         
     }                                                                                                                  \
     VARNEX_ROW_(::varnex3::rows::Method<Self, &Self::ParseXML>("ParseXML", "(const Text& sXML)", doc))
 
-// ParseXML of a whole message. Its result is the message written again from what was read.
+// ParseXML of a whole message, and of a few records: its result is the text written again from what was read.
 #define VARNEX_PARSEXML_OF_MESSAGE(Type_, doc)                                                                         \
     void Read(const ::varnex3::XmlSection& section);                                                                   \
     Type_ ParseXML(const ::varnex3::Text& sXML)                                                                        \

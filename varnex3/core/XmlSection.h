@@ -60,6 +60,9 @@ public:
     // The value of the first attribute of an element, whatever it is called; without one raises ObjectNotSet.
     Text FirstAttributeOf(const xml::Node& node) const;
 
+    // The same of an element that must be there; an absent one raises ObjectNotSet, too.
+    Text RequiredFirstAttributeAt(ElementPath path) const { return FirstAttributeOf(Require(path)); }
+
     // Has a child record read the section at a path; an absent section is an empty document.
     template <class T, Ref<T> (*Make)()>
     void ReadInto(const Child<T, Make>& child, ElementPath path) const;

@@ -60,6 +60,12 @@ void XmlWriter::Open(Name group)
     ++level;
 }
 
+void XmlWriter::OpenWithAttribute(Name group, Name attribute, TextView about)
+{
+    PutLine('<', group, ' ', attribute, Name("=\""), about, Name("\">"), kLineEnd);
+    ++level;
+}
+
 void XmlWriter::Close(Name group)
 {
     --level;

@@ -33,7 +33,10 @@ public:
     void Open(Name group);
     void Close(Name group);
 
-    // The same for a group that is written only when something is written inside it.
+    // A group's start tag with an attribute, whatever the value: <group attribute="about">.
+    void OpenWithAttribute(Name group, Name attribute, TextView about);
+
+    // A start tag and end tag that are written only when something is written inside them.
     struct Mark
     {
         Name group;
