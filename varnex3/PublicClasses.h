@@ -62,7 +62,12 @@ using OutcomeClasses = ClassList<
     // what else ends a job
     Xalo_Declined, DeclinedDetailDef, Xalo_JobCancelled>;
 
-using NoticesClasses = ClassList<VarnexReferenceDataEnum>;
+using NoticesClasses = ClassList<
+    // errors
+    Xalo_Error, ErrorDetailsDef, ErrorDetailsItem, ErrorDetailsDefDataContentError, ErrorDetailsDefMessageOrderError,
+    ErrorDetailsDefMessageTypeError, ErrorDetailsDefMiscellaneousError,
+    // versions and reference data
+    VarnexReferenceDataEnum>;
 
 using InboxClasses = ClassList<MessageDef, Xalo_Messages>;
 
