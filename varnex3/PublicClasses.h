@@ -66,6 +66,8 @@ using NoticesClasses = ClassList<
     // errors
     Xalo_Error, ErrorDetailsDef, ErrorDetailsItem, ErrorDetailsDefDataContentError, ErrorDetailsDefMessageOrderError,
     ErrorDetailsDefMessageTypeError, ErrorDetailsDefMiscellaneousError,
+    // images
+    Xalo_Image,
     // versions and reference data
     VarnexReferenceDataEnum>;
 

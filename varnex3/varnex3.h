@@ -26,6 +26,7 @@
 #include "varnex3/notices/ErrorDetailsItem.h"
 #include "varnex3/notices/VarnexReferenceDataEnum.h"
 #include "varnex3/notices/Xalo_Error.h"
+#include "varnex3/notices/Xalo_Image.h"
 #include "varnex3/outcomes/AdjustmentNoteDetailsDef.h"
 #include "varnex3/outcomes/DeclinedDetailDef.h"
 #include "varnex3/outcomes/ExpectedPaymentDetailsDef.h"
