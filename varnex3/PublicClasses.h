@@ -69,7 +69,8 @@ using NoticesClasses = ClassList<
     // images
     Xalo_Image,
     // versions and reference data
-    VarnexReferenceDataEnum>;
+    Xalo_VarnexVersionChange, VersionChangeDef, Xalo_VarnexReferenceData, ReferenceDataDef, ReferenceDataDefDataType,
+    ReferenceDataDefDataTypeDataValue, VarnexReferenceDataEnum>;
 
 using InboxClasses = ClassList<MessageDef, Xalo_Messages>;
 
