@@ -6,6 +6,7 @@
 #include "varnex3/core/ClaimHeaderDef.h"
 #include "varnex3/core/CustomerDef.h"
 #include "varnex3/core/PersonalNameDef.h"
+#include "varnex3/core/modFunctions.h"
 
 using namespace varnex3;
 using tests::RaisedBy;
@@ -225,4 +226,35 @@ TEST_CASE("Serialise: twice the same text, and nothing in the record changes")
     const Text first = customer->Serialise();
     CHECK(customer->Serialise() == first);
     CHECK(first.size() > 150000);
+}
+
+TEST_CASE(
+    "XmlWriter: what is Escaped is written with entities, also where the first room ends; the empty text is not set")
+{
+    CHECK(TextOf([](XmlWriter& xml) { xml.Always("A", Escaped(u"a&<>'\"&amp;")); })
+          == u"\t<A>a&amp;&lt;&gt;&apos;&quot;&amp;amp;</A>\r\n");
+    CHECK(TextOf([](XmlWriter& xml) { xml.IfSet("A", Escaped(u"")); }) == u"");
+    CHECK(TextOf([](XmlWriter& xml) { xml.Line("<A b='", Escaped(u"'"), "'/>"); }) == u"\t<A b='&apos;'/>\r\n");
+    const Text quotes(XmlWriter::kUsualRoom / 6, u'"');
+    CHECK(TextOf([&](XmlWriter& xml) { xml.Always("A", Escaped(quotes)); })
+          == u"\t<A>" + EscapeXML(quotes) + u"</A>\r\n");
+}
+
+TEST_CASE("XmlWriter: a list is whole, whether its items grow, shrink or stay as they are")
+{
+    const auto isWhole = [](std::size_t count, const std::function<std::size_t(std::size_t)>& lengthAt) {
+        std::vector<Ref<ClaimHeaderDef>> items;
+        Text expected;
+        for (std::size_t i = 0; i < count; ++i) {
+            items.push_back(New<ClaimHeaderDef>());
+            items.back()->VehicleID(Text(lengthAt(i), u'x'));
+            expected += items.back()->Serialise();
+        }
+        return TextOf([&](XmlWriter& xml) { xml.AppendEach(items); }) == expected;
+    };
+    CHECK(isWhole(0, [](std::size_t) { return 0; }));
+    CHECK(isWhole(2000, [](std::size_t) { return 40; }));
+    CHECK(isWhole(2000, [](std::size_t i) { return i; }));
+    CHECK(isWhole(2000, [](std::size_t i) { return 2000 - i; }));
+    CHECK(isWhole(3, [](std::size_t) { return XmlWriter::kUsualRoom; }));
 }

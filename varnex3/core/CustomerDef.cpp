@@ -1,7 +1,5 @@
 #include "varnex3/core/CustomerDef.h"
 
-#include "varnex3/core/modFunctions.h"
-
 namespace varnex3 {
 
 VARNEX_DEFINE(CustomerDef);
@@ -15,7 +13,7 @@ void CustomerDef::Write(XmlWriter& xml) const
 
     xml.Open("Customer");
     xml.Append(objPersonalName);
-    xml.IfSet("CompanyName", EscapeXML(sCompanyName));
+    xml.IfSet("CompanyName", Escaped(sCompanyName));
     xml.IfSet("BusinessPhone", sBusinessPhone);
     xml.IfSet("Fax", sFax);
     xml.IfSet("MobilePhone", sMobilePhone);

@@ -1,7 +1,5 @@
 #include "varnex3/core/PersonalNameDef.h"
 
-#include "varnex3/core/modFunctions.h"
-
 namespace varnex3 {
 
 VARNEX_DEFINE(PersonalNameDef);
@@ -15,7 +13,7 @@ void PersonalNameDef::Write(XmlWriter& xml) const
         return;
 
     xml.Open("PersonalName");
-    xml.IfSet("Title", EscapeXML(sTitle)); // the only value here that is escaped
+    xml.IfSet("Title", Escaped(sTitle)); // the only value here that is escaped
     xml.IfSet("Forname", sForname);
     xml.Always("Surname", sSurname); // also when empty
     xml.IfSet("HomePhone", sHomePhone);

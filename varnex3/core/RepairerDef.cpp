@@ -1,7 +1,6 @@
 #include "varnex3/core/RepairerDef.h"
 
 #include "varnex3/core/PartyFields.h"
-#include "varnex3/core/modFunctions.h"
 
 namespace varnex3 {
 
@@ -15,7 +14,7 @@ void RepairerDef::Write(XmlWriter& xml) const
 
     xml.Open("Repairer");
     xml.Always("RepairerID", sRepairerID);
-    xml.Always("RepairerName", EscapeXML(sRepairerName));
+    xml.Always("RepairerName", Escaped(sRepairerName));
     WriteFields(xml, "RepairerDetails", *objRepairerDetails);
     xml.Close("Repairer");
 }

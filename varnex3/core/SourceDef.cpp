@@ -12,7 +12,7 @@ void SourceDef::Write(XmlWriter& xml) const
     xml.Always("OrgType", sOrgType);
     xml.Always("AppVersion", sAppVersion);
     xml.Always("AppName", sAppName);
-    xml.Always("TimeStamp", FormatDate(dtTimeStamp, 1)); // the zero date, too
+    xml.Always("TimeStamp", DateText(dtTimeStamp, 1).View()); // the zero date, too
     xml.Close("Source");
 }
 

@@ -16,6 +16,7 @@ constexpr TextView kLineEnd = u"\r\n";
 constexpr std::size_t LengthOf(char /*character*/) { return 1; }
 constexpr std::size_t LengthOf(Name name) { return name.size(); }
 constexpr std::size_t LengthOf(TextView text) { return text.size(); }
+constexpr std::size_t LengthOf(Escaped text) { return text.Length(); }
 
 char16_t* Put(char16_t* to, char character)
 {
@@ -24,6 +25,18 @@ char16_t* Put(char16_t* to, char character)
 }
 char16_t* Put(char16_t* to, Name name) { return std::copy(name.begin(), name.end(), to); }
 char16_t* Put(char16_t* to, TextView text) { return std::copy(text.begin(), text.end(), to); }
+char16_t* Put(char16_t* to, Escaped text) { return text.Put(to); }
+
+constexpr TextView kTabs = u"\t\t\t\t\t\t\t\t";
+
+// Writes always as many as one instruction does, of which the rest is written over: there is room for that.
+char16_t* PutTabs(char16_t* to, std::size_t count)
+{
+    if (count > kTabs.size()) [[unlikely]]
+        return std::fill_n(to, count, u'\t');
+    kTabs.copy(to, kTabs.size());
+    return to + count;
+}
 
 } // namespace
 
@@ -33,10 +46,33 @@ void XmlWriter::PutLine(Part... parts)
     const auto tabs = static_cast<std::size_t>(level);
     const std::size_t start = length;
     length += tabs + (LengthOf(parts) + ...);
-    if (length > room.size())
-        return;
-    char16_t* to = std::fill_n(room.data() + start, tabs, u'\t');
+    if (length + kTabs.size() > room.size()) [[unlikely]] {
+        if (!keepsText)
+            return;
+        Grow(start);
+    }
+    char16_t* to = PutTabs(room.data() + start, tabs);
     ((to = Put(to, parts)), ...);
+}
+
+// What stands before the line that does not fit is kept. A list goes on as it began, give or take an eighth.
+void XmlWriter::Grow(std::size_t written)
+{
+    std::size_t wanted = 2 * length;
+    if (list.done > 0)
+        wanted = length + (written - list.start) / list.done * (list.count - list.done);
+    Text larger(wanted + wanted / 8 + kTabs.size(), u'\0');
+    std::copy_n(room.data(), written, larger.data());
+    grown = std::move(larger);
+    room = grown;
+}
+
+Text XmlWriter::Taken()
+{
+    if (grown.empty())
+        return {room.data(), length};
+    grown.resize(length);
+    return std::move(grown);
 }
 
 void XmlWriter::OpenMessage(Name root)
@@ -92,7 +128,12 @@ void XmlWriter::Always(Name element, TextView value)
     PutLine('<', element, '>', value, Name("</"), element, '>', kLineEnd);
 }
 
-void XmlWriter::Always(Name element, Date value) { Always(element, TextView(FormatDate(value, 0))); }
+void XmlWriter::Always(Name element, Escaped value)
+{
+    PutLine('<', element, '>', value, Name("</"), element, '>', kLineEnd);
+}
+
+void XmlWriter::Always(Name element, Date value) { Always(element, DateText(value, 0).View()); }
 
 void XmlWriter::Always(Name element, double amount)
 {
@@ -108,6 +149,12 @@ void XmlWriter::Always(Name element, double amount)
 void XmlWriter::Always(Name element, std::int32_t value) { Always(element, NumberText(value).View()); }
 
 void XmlWriter::IfSet(Name element, TextView value)
+{
+    if (IsSet(value))
+        Always(element, value);
+}
+
+void XmlWriter::IfSet(Name element, Escaped value)
 {
     if (IsSet(value))
         Always(element, value);
@@ -132,6 +179,8 @@ void XmlWriter::Flag(Name element, bool isSet)
 }
 
 void XmlWriter::Line(TextView text) { PutLine(text, kLineEnd); }
+
+void XmlWriter::Line(Name before, Escaped value, Name after) { PutLine(before, value, after, kLineEnd); }
 
 void XmlWriter::AlwaysWithAttribute(Name element, Name attribute, TextView about, TextView value)
 {

@@ -1,15 +1,17 @@
 // Writes the lines of a record, each by a verb that says when the line is written.
 //
 // Every line stands at the level of the groups open around it, one TAB a level, and ends with CR LF. Values are written
-// as they are; what is to be escaped is handed over escaped (EscapeXML).
+// as they are; what is to be escaped is handed over as Escaped(value).
 #pragma once
 
 #include <array>
 #include <cstdint>
 #include <span>
 #include <utility>
+#include <vector>
 
 #include "varnex3/core/Date.h"
+#include "varnex3/core/Escaped.h"
 #include "varnex3/core/Record.h"
 #include "varnex3/core/Text.h"
 
@@ -18,7 +20,7 @@ namespace varnex3 {
 class XmlWriter
 {
 public:
-    // Characters that are written at once; a longer text is measured before it is allocated. Most messages are shorter.
+    // Characters that are written before any room is allocated. Most messages are shorter.
     static constexpr std::size_t kUsualRoom = 24 * 1024;
 
     // The text of a record: what its Write writes, at the level of its class (T::kLevel).
@@ -53,12 +55,14 @@ public:
 
     // A value line, whatever the value: <name>value</name>. Dates are written as yyyy-mm-dd, amounts as "0.00".
     void Always(Name element, TextView value);
+    void Always(Name element, Escaped value);
     void Always(Name element, Date value);
     void Always(Name element, double amount);
     void Always(Name element, std::int32_t value);
 
     // A value line, unless the text is empty or the date is the zero date.
     void IfSet(Name element, TextView value);
+    void IfSet(Name element, Escaped value);
     void IfSet(Name element, Date value);
 
     // A value line, only for an amount greater than 0.
@@ -72,6 +76,7 @@ public:
 
     // Anything else that is one line.
     void Line(TextView text);
+    void Line(Name before, Escaped value, Name after);
 
     // What a child record writes.
     template <class T, Ref<T> (*Make)()>
@@ -85,17 +90,37 @@ public:
     template <class T>
     void Append(const Ref<T>& item);
 
+    // What the records of a list write, one behind the other.
+    template <class T>
+    void AppendEach(const std::vector<Ref<T>>& items);
+
 private:
-    // The record is the class whose Serialise raises what goes wrong here.
-    XmlWriter(std::span<char16_t> room_, int level_, Name record_) : room(room_), level(level_), record(record_) {}
+    // The record is the class whose Serialise raises what goes wrong here. Without a text to keep a writer only counts.
+    XmlWriter(std::span<char16_t> room_, bool keepsText_, int level_, Name record_)
+        : room(room_), keepsText(keepsText_), level(level_), record(record_)
+    {}
 
     // One line at this level, its parts one after the other: names, texts and single characters.
     template <class... Part>
     void PutLine(Part... parts);
 
-    // Room for the text: a line that does not fit is counted only, so that the second time the room is exact.
+    // Makes room for the length, with the text written before at its start.
+    void Grow(std::size_t written);
+    Text Taken();
+
+    // How far the innermost list has come, from which the room for the rest of it is guessed.
+    struct ListProgress
+    {
+        std::size_t start = 0; // where the first item begins
+        std::size_t done = 0;
+        std::size_t count = 0;
+    };
+
     std::span<char16_t> room;
+    Text grown; // the room of a text that is longer than usual
+    bool keepsText;
     std::size_t length = 0;
+    ListProgress list;
     int level;
     Name record;
 };
@@ -104,21 +129,15 @@ template <class T>
 Text XmlWriter::TextOf(const T& record)
 {
     std::array<char16_t, kUsualRoom> usual; // NOLINT(cppcoreguidelines-pro-type-member-init): filled by the writer
-    XmlWriter first(usual, T::kLevel, T::ClassName);
-    record.Write(first);
-    if (first.length <= usual.size())
-        return {usual.data(), first.length};
-
-    Text text(first.length, u'\0');
-    XmlWriter second(text, T::kLevel, T::ClassName);
-    record.Write(second);
-    return text;
+    XmlWriter writer(usual, true, T::kLevel, T::ClassName);
+    record.Write(writer);
+    return writer.Taken();
 }
 
 template <class T, Ref<T> (*Make)()>
 bool XmlWriter::Writes(const Child<T, Make>& child)
 {
-    XmlWriter counter({}, T::kLevel, T::ClassName);
+    XmlWriter counter({}, false, T::kLevel, T::ClassName);
     child->Write(counter);
     return counter.length > 0;
 }
@@ -137,6 +156,17 @@ void XmlWriter::Append(const Ref<T>& item)
     item->Write(*this);
     level = outerLevel;
     record = outerRecord;
+}
+
+template <class T>
+void XmlWriter::AppendEach(const std::vector<Ref<T>>& items)
+{
+    const ListProgress outerList = std::exchange(list, {length, 0, items.size()});
+    for (const Ref<T>& item : items) {
+        Append(item);
+        ++list.done;
+    }
+    list = outerList;
 }
 
 } // namespace varnex3

@@ -1,19 +1,12 @@
 #include "varnex3/core/modFunctions.h"
 
+#include "varnex3/core/Escaped.h"
+
 namespace varnex3 {
 
 VARNEX_MODULE_DEFINE(modFunctions);
 
 namespace {
-
-// The digits of a number, padded with zeros to a width.
-Text Padded(std::int32_t number, std::size_t width)
-{
-    Text digits(width, u'0');
-    for (std::size_t i = width; i-- > 0; number /= 10)
-        digits[i] = static_cast<char16_t>(u'0' + number % 10);
-    return digits;
-}
 
 CivilDate CivilFor(Name operation, Date date)
 {
@@ -26,53 +19,43 @@ CivilDate CivilFor(Name operation, Date date)
 
 } // namespace
 
-Text FormatDate(Date value, std::int32_t style)
+DateText::DateText(Date value, std::int32_t style)
 {
     if (style < 0 || style > 3)
-        return {};
+        return;
     const CivilDate civil = CivilFor("modFunctions.FormatDate", value);
-    const Text year = Padded(civil.year, 4);
-    const Text month = Padded(civil.month, 2);
-    const Text day = Padded(civil.day, 2);
-    switch (style) {
-    case 0:
-        return year + u"-" + month + u"-" + day;
-    case 1:
-        return year + u"-" + month + u"-" + day + u"T" + Padded(civil.hour, 2) + u":" + Padded(civil.minute, 2) + u":"
-               + Padded(civil.second, 2);
-    case 2:
-        return day + u"/" + month + u"/" + year.substr(2);
-    default:
-        return day + u"/" + month + u"/" + year;
+    if (style > 1) {
+        Put(civil.day, 2).Put(u'/').Put(civil.month, 2).Put(u'/').Put(civil.year, style == 2 ? 2 : 4);
+        return;
     }
+    Put(civil.year, 4).Put(u'-').Put(civil.month, 2).Put(u'-').Put(civil.day, 2);
+    if (style == 1)
+        Put(u'T').Put(civil.hour, 2).Put(u':').Put(civil.minute, 2).Put(u':').Put(civil.second, 2);
 }
+
+DateText& DateText::Put(char16_t character)
+{
+    room[length++] = character;
+    return *this;
+}
+
+// The last digits of a number, zeros in front.
+DateText& DateText::Put(std::int32_t number, std::size_t digits)
+{
+    length += digits;
+    for (std::size_t i = length; digits > 0; --digits, number /= 10)
+        room[--i] = static_cast<char16_t>(u'0' + number % 10);
+    return *this;
+}
+
+Text FormatDate(Date value, std::int32_t style) { return Text(DateText(value, style).View()); }
 
 Text EscapeXML(TextView text)
 {
-    Text escaped;
-    escaped.reserve(text.size());
-    for (const char16_t c : text) {
-        switch (c) {
-        case u'&':
-            escaped += u"&amp;";
-            break;
-        case u'<':
-            escaped += u"&lt;";
-            break;
-        case u'>':
-            escaped += u"&gt;";
-            break;
-        case u'\'':
-            escaped += u"&apos;";
-            break;
-        case u'"':
-            escaped += u"&quot;";
-            break;
-        default:
-            escaped += c;
-        }
-    }
-    return escaped;
+    const Escaped escaped(text);
+    Text result(escaped.Length(), u'\0');
+    escaped.Put(result.data());
+    return result;
 }
 
 bool SplitDateTime(TextView text, Text& datePart, Text& timePart, Text& zonePart)

@@ -1,6 +1,8 @@
 // Dates as text, the parts of an ISO date-time, and escaping.
 #pragma once
 
+#include <array>
+
 #include "varnex3/core/Rows.h"
 
 namespace varnex3 {
@@ -22,5 +24,21 @@ VARNEX_FUNCTION(
     "InvalidArgument (5). The result is always False.");
 
 VARNEX_MODULE_END(modFunctions);
+
+// A date as FormatDate gives it, in room of its own: nothing is allocated.
+class DateText
+{
+public:
+    DateText(Date value, std::int32_t style);
+    TextView View() const { return {room.data(), length}; }
+
+private:
+    DateText& Put(char16_t character);
+    DateText& Put(std::int32_t number, std::size_t digits);
+
+    static constexpr std::size_t kLongest = 19; // 2004-03-15T14:05:09
+    std::array<char16_t, kLongest> room;        // NOLINT(cppcoreguidelines-pro-type-member-init): as far as length says
+    std::size_t length = 0;
+};
 
 } // namespace varnex3

@@ -1,6 +1,5 @@
 #include "varnex3/quote/InspectionDef.h"
 
-#include "varnex3/core/modFunctions.h"
 #include "varnex3/quote/OneLine.h"
 
 namespace varnex3 {
@@ -12,8 +11,8 @@ void InspectionDef::Write(XmlWriter& xml) const
     if (!IsSet(sInspectionReason))
         return;
 
-    xml.Line(u"<InspectionReqested InspectionReason='" + EscapeXML(OnOneLine(sInspectionReason))
-             + u"'></InspectionReqested>");
+    xml.Line("<InspectionReqested InspectionReason='", Escaped(OnOneLine(sInspectionReason)),
+             "'></InspectionReqested>");
 }
 
 void InspectionDef::Read(const XmlSection& section)

@@ -1,7 +1,5 @@
 #include "varnex3/quote/QuoteDetailsDef.h"
 
-#include "varnex3/core/modFunctions.h"
-
 namespace varnex3 {
 
 VARNEX_DEFINE(QuoteDetailsDef);
@@ -57,7 +55,7 @@ void QuoteDetailsDef::Write(XmlWriter& xml) const
     xml.IfSet("EstimatedEndDate", dtEstimatedEndDate);
     xml.Always("ExcessToCollect", dExcessToCollect); // 0 and less, too
     xml.Append(objOwnersContributionToCollect);
-    xml.IfSet("OpenText", EscapeXML(sOpenText));
+    xml.IfSet("OpenText", Escaped(sOpenText));
     xml.IfSet("QuoterName", sQuoterName);
     xml.Close("QuoteDetails");
 }

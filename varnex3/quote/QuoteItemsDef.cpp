@@ -26,8 +26,7 @@ void QuoteItemsDef::Write(XmlWriter& xml) const
         return;
 
     xml.Open("QuoteItems");
-    for (const Ref<QuoteItem>& item : items)
-        xml.Append(item);
+    xml.AppendEach(items);
     xml.Close("QuoteItems");
 }
 

@@ -1,7 +1,5 @@
 #include "varnex3/quote/VehicleDetailsDef.h"
 
-#include "varnex3/core/modFunctions.h"
-
 namespace varnex3 {
 
 VARNEX_DEFINE(VehicleDetailsDef);
@@ -24,7 +22,7 @@ void VehicleDetailsDef::Write(XmlWriter& xml) const
     xml.IfPositive("EngineSize", dEngineSize);
     xml.IfSet("NoOfCylinders", sNoOfCylinders);
     xml.IfSet("Transmission", sTransmission);
-    xml.IfSet("Colour", EscapeXML(sColour)); // the only value here that is escaped
+    xml.IfSet("Colour", Escaped(sColour)); // the only value here that is escaped
     xml.IfSet("ManufacturerPaintGroup", sManufacturerPaintGroup);
     xml.IfSet("ManufacturerTrimCode", sManufacturerTrimCode);
     xml.IfSet("PaintCode", sPaintCode);

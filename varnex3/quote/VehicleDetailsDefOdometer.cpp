@@ -9,7 +9,7 @@ bool VehicleDetailsDefOdometer::IsWritten() const
     if (!IsSet(sOdometerReading))
         return false;
     try {
-        return ToInt32(sOdometerReading) > 0;
+        return Int32From(sOdometerReading) > 0;
     } catch (const Error& error) { // a reading that is no number is not passed over
         throw error.About("VehicleDetailsDefOdometer.Serialise", u"OdometerReading");
     }
