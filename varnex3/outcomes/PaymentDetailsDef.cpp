@@ -76,7 +76,7 @@ void PaymentDetailsDef::Read(const XmlSection& section)
 
 Ref<PaymentDetailsDef> NewLastInvoiceDetails()
 {
-    const auto details = New<PaymentDetailsDef>();
+    auto details = New<PaymentDetailsDef>();
     details->PaymentDetailsType(PaymentDetailsTypeEnum::LastInvoiceDetails);
     return details;
 }
