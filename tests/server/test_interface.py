@@ -3,8 +3,11 @@
 
 from __future__ import annotations
 
+import importlib.machinery
+import importlib.util
 import os
 import pathlib
+import re
 import subprocess
 import sys
 import tempfile
@@ -15,6 +18,10 @@ BINARY = pathlib.Path(os.environ["VARNEX3_BINARY_DIR"])
 sys.path.insert(0, str(SOURCE / "tests"))
 
 import snapshot  # noqa: E402
+
+loader = importlib.machinery.SourceFileLoader("coverage", str(SOURCE / "scripts/coverage"))
+coverage = importlib.util.module_from_spec(importlib.util.spec_from_loader("coverage", loader))  # type: ignore[arg-type]
+loader.exec_module(coverage)
 
 RECORDED = (SOURCE / "docs/interface.txt").read_text()
 LISTING = """library Varnex3 3.0 {AAAA}
@@ -53,6 +60,24 @@ class Recorded(snapshot.Comparison):
     def test_the_idl_is_the_one_that_the_build_compiles(self) -> None:
         recorded, built = (folder / "interface.idl" for folder in (SOURCE / "docs", self.folder))
         self.assert_nothing(snapshot.changed_lines(recorded.read_text(), built.read_text()))
+
+    def test_the_coverage_is_that_of_the_build(self) -> None:
+        recorded, built = (folder / "coverage.md" for folder in (SOURCE / "docs", self.folder))
+        self.assert_nothing(snapshot.changed_lines(recorded.read_text(), built.read_text()))
+
+    def test_every_kind_of_host_has_every_class_member_and_constant(self) -> None:
+        page = (self.folder / "coverage.md").read_text()
+        self.assert_nothing("\n".join(line for line in page.splitlines() if "missing" in line))
+        for _, *counts in re.findall(r"^\| \d+ (\w+) \| \w+ \|" + r" (\d+) \|" * 4, page, re.MULTILINE):
+            self.assertEqual(len(set(counts)), 1, counts)
+
+    def test_every_class_and_enumeration_of_the_headers_is_covered(self) -> None:
+        """One that is in no list of classes, or that no member uses, is public in C++ alone."""
+        headers = "".join(header.read_text() for header in (SOURCE / "varnex3").rglob("*.h"))
+        declared = set(re.findall(r"^ *VARNEX_(?:RECORD|ENUM|MODULE)\((\w+),\s*\"", headers, re.MULTILINE))
+        covered = set(re.findall(r"^### (\w+)$", (self.folder / "coverage.md").read_text(), re.MULTILINE))
+        self.assertGreater(len(declared), 60)
+        self.assertEqual(declared, covered)
 
 
 class Listing(unittest.TestCase):
@@ -106,6 +131,33 @@ class Differences(unittest.TestCase):
     def test_a_line_that_tells_nothing_known_is_an_error(self) -> None:
         with self.assertRaises(ValueError):
             self.told("       5  Five", "five")
+
+
+class Coverage(unittest.TestCase):
+    """How the coverage is found: it must not be blind."""
+
+    def test_what_does_not_compile_is_told(self) -> None:
+        uses = ["using Use = VersionDef;", "using Use = NoDef;", "constexpr auto Used = &VersionDef::Serialize;"]
+        self.assertEqual(coverage.compiled(uses), {1, 2})
+
+    def test_a_property_of_another_type_is_told(self) -> None:
+        uses = [coverage.cpp_use("VersionDef", "get", "XaloVersion", None, of) for of in ("Text", "Date")]
+        self.assertEqual(coverage.compiled(uses), {1})
+
+    def test_a_read_only_property_cannot_be_stored(self) -> None:
+        uses = [coverage.cpp_use("VersionDef", "put", name, None, "Text") for name in ("XaloVersion", "DLLVersion")]
+        self.assertEqual(coverage.compiled(uses), {1})
+
+    def test_the_listing_is_read_whole(self) -> None:
+        facts = coverage.component_facts(LISTING)
+        self.assertEqual(facts["class", "ADef"], {"First": "1 get", "Second": "2 get"})
+        self.assertEqual(facts["enum", "KindEnum"], {"One": "0", "Five": "5"})
+
+    def test_what_one_kind_of_host_lacks_is_missing(self) -> None:
+        one = {("class", "ADef"): {"First": "get"}, ("class", "BDef"): {}}
+        page = coverage.page({"C++": one, "COM": {("class", "ADef"): {}}})
+        self.assertIn("| First | get | **missing** |", page)
+        self.assertIn("### BDef\n\n**missing** in COM", page)
 
 
 if __name__ == "__main__":
