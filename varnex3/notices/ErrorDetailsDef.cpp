@@ -15,7 +15,7 @@ Text ErrorDetailsDef::ErrorItemsDescCSV(const Text& sDelimiter)
     if (items.Count() == 0)
         return {};
     Text joined;
-    for (const Ref<ErrorDetailsItem>& item : items)
+    for (const Ref<ErrorDetailsItem>& item : items.All())
         joined += item->Descriptions(sDelimiter);
     if (joined.empty())
         Raise(ErrorNumber::InvalidArgument, "ErrorDetailsDef.ErrorItemsDescCSV",
@@ -26,11 +26,7 @@ Text ErrorDetailsDef::ErrorItemsDescCSV(const Text& sDelimiter)
 
 std::int32_t ErrorDetailsDef::Count() const { return static_cast<std::int32_t>(items.Count()); }
 
-void ErrorDetailsDef::Write(XmlWriter& xml) const
-{
-    for (const Ref<ErrorDetailsItem>& item : items)
-        xml.Append(item);
-}
+void ErrorDetailsDef::Write(XmlWriter& xml) const { xml.AppendEach(items.All()); }
 
 void ErrorDetailsDef::Read(const XmlSection& section) { Add()->Read(section); }
 

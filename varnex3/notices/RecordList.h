@@ -28,8 +28,7 @@ public:
         return position >= 0 && index < records.size() ? records[index] : nullptr;
     }
 
-    typename std::vector<Ref<T>>::const_iterator begin() const { return records.begin(); }
-    typename std::vector<Ref<T>>::const_iterator end() const { return records.end(); }
+    const std::vector<Ref<T>>& All() const { return records; }
 
 private:
     std::vector<Ref<T>> records;

@@ -17,8 +17,7 @@ std::int16_t ReferenceDataDef::Count() const { return CountOf(types.Count(), "Re
 void ReferenceDataDef::Write(XmlWriter& xml) const
 {
     xml.Open("ReferenceData"); // also without any data type
-    for (const Ref<ReferenceDataDefDataType>& type : types)
-        xml.Append(type);
+    xml.AppendEach(types.All());
     xml.Close("ReferenceData");
 }
 
@@ -42,8 +41,7 @@ std::int16_t ReferenceDataDefDataType::Count() const
 void ReferenceDataDefDataType::Write(XmlWriter& xml) const
 {
     xml.OpenWithAttribute("DataType", "Name", sNameAttribute);
-    for (const Ref<ReferenceDataDefDataTypeDataValue>& value : values)
-        xml.Append(value);
+    xml.AppendEach(values.All());
     xml.Close("DataType");
 }
 
