@@ -19,9 +19,10 @@ $(BUILD)/CMakeCache.txt: CMakePresets.json
 	@scripts/setup
 	@cmake --preset release
 
-demo: setup build ## build what is missing, summarise the sample inbox, show the doctor's page
+demo: setup build ## build what is missing, summarise the sample inbox, show the doctor's page and a whole repair job
 	@$(BUILD)/tools/varnex3 scan samples/inbox; test $$? -le 1
 	@echo; $(BUILD)/tools/varnex3 doctor; test $$? -le 1
+	@echo; PYTHONPATH=bindings/python python3 -B samples/python/repair_job.py samples/messages
 
 test: setup build windows ## build and run every test, those of the component under Wine
 	@scripts/setup samples
