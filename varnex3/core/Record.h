@@ -6,6 +6,7 @@
 #include <cstddef>
 #include <cstdint>
 #include <memory>
+#include <type_traits>
 #include <utility>
 
 namespace varnex3 {
@@ -103,6 +104,11 @@ Ref<T> New()
     return Ref<T>(new T);
 }
 
+// Whether two functions are one. As types: a sanitizer build does not compare addresses while it compiles.
+template <auto A, auto B>
+inline constexpr bool kIsSameFunction =
+    std::is_same_v<std::integral_constant<decltype(A), A>, std::integral_constant<decltype(A), B>>;
+
 // A child of a record: made on first use, by a function of its own where it is to start with other values than its
 // class's. One that is set to nothing is a new one of its class.
 template <class T, Ref<T> (*Make)() = &New<T>>
@@ -112,8 +118,7 @@ public:
     Child() = default;
     Child(Ref<T> given) : record(std::move(given))
     {
-        constexpr bool startsAsItsClass = Make == &New<T>;
-        if (!startsAsItsClass && !record)
+        if (!kIsSameFunction<Make, &New<T>> && !record)
             record = New<T>();
     }
 
