@@ -4,7 +4,7 @@ BUILD := build/release
 CMAKE_BUILD = cmake --build --preset $(1) --parallel $(JOBS)
 
 .DEFAULT_GOAL := build
-.PHONY: help setup build demo test sanitize threads windows dist delphi bench format layout tidy docs install clean
+.PHONY: help setup build demo test sanitize threads windows automation dist delphi bench format layout tidy docs install clean
 
 help: ## this list
 	@sed -n 's/^\([a-z]*\):.*## /\1\t/p' $(MAKEFILE_LIST) | expand -t 12
@@ -24,9 +24,12 @@ demo: setup build ## build what is missing, summarise the sample inbox, show the
 	@echo; $(BUILD)/tools/varnex3 doctor; test $$? -le 1
 	@echo; PYTHONPATH=bindings/python python3 -B samples/python/repair_job.py samples/messages
 
-test: setup build windows ## build and run every test, those of the component under Wine
+test: setup build ## build and run every test of this system
 	@scripts/setup samples
-	@scripts/run_tests $(BUILD) build/win32 build/win64
+	@scripts/run_tests $(BUILD)
+
+automation: windows ## build the component and run its tests, with automation hosts under Wine
+	@scripts/run_tests build/win32 build/win64
 
 sanitize: setup ## build with the address and undefined-behaviour sanitizers and run every test
 	@cmake --preset asan
