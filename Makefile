@@ -4,10 +4,11 @@ BUILD := build/release
 CMAKE_BUILD = cmake --build --preset $(1) --parallel $(JOBS)
 
 .DEFAULT_GOAL := build
-.PHONY: help setup build demo test sanitize threads windows automation dist delphi bench format layout tidy docs install clean
+.PHONY: help setup build demo test sanitize threads windows automation dist delphi bench bench-windows format layout \
+	tidy docs install clean
 
 help: ## this list
-	@sed -n 's/^\([a-z]*\):.*## /\1\t/p' $(MAKEFILE_LIST) | expand -t 12
+	@sed -n 's/^\([a-z-]*\):.*## /\1\t/p' $(MAKEFILE_LIST) | expand -t 16
 
 setup: ## install what is missing (Debian packages), saying what it does
 	@scripts/setup
@@ -24,11 +25,11 @@ demo: setup build ## build what is missing, summarise the sample inbox, show the
 	@echo; $(BUILD)/tools/varnex3 doctor; test $$? -le 1
 	@echo; PYTHONPATH=bindings/python python3 -B samples/python/repair_job.py samples/messages
 
-test: setup build ## build and run every test of this system
+test: setup build windows ## build everything and run every test, those of the component with automation hosts under Wine
 	@scripts/setup samples
-	@scripts/run_tests $(BUILD)
+	@scripts/run_tests $(BUILD) build/win32 build/win64
 
-automation: windows ## build the component and run its tests, with automation hosts under Wine
+automation: windows ## build the component and run its tests alone
 	@scripts/run_tests build/win32 build/win64
 
 sanitize: setup ## build with the address and undefined-behaviour sanitizers and run every test
@@ -59,6 +60,9 @@ bench: setup ## measure against the peers, print the ratios
 	@cmake --preset bench
 	@$(call CMAKE_BUILD,bench)
 	@benchmarks/run build/bench
+
+bench-windows: windows ## measure what the component costs its hosts
+	@benchmarks/windows/run build/win32 build/win64
 
 format: ## lay out every C++ file
 	@scripts/setup tidy

@@ -2,6 +2,7 @@
 //
 // A program of its own, because Wine never releases the class objects that it gives to such a host: the DLL stays
 // loaded.
+#include "tests/windows/Printing.h"
 #include "tests/windows/early/EarlyBound.h"
 
 using namespace varnex3::tests;

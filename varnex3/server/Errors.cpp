@@ -1,8 +1,10 @@
 #include "varnex3/server/Errors.h"
 
+#include <bit>
 #include <string>
 
 #include "varnex3/core/Error.h"
+#include "varnex3/server/Guids.h"
 
 namespace varnex3::server {
 
@@ -12,11 +14,12 @@ HRESULT StatusOf(std::int32_t number) { return MAKE_HRESULT(SEVERITY_ERROR, FACI
 
 LPOLESTR HostText(const Text& text) { return reinterpret_cast<LPOLESTR>(const_cast<char16_t*>(text.c_str())); }
 
-void LeaveWithThread(const Error& error)
+void LeaveWithThread(const Error& error, Name className)
 {
     ICreateErrorInfo* made = nullptr;
     if (FAILED(CreateErrorInfo(&made)))
         return;
+    made->SetGUID(std::bit_cast<GUID>(InterfaceGuid(className)));
     made->SetSource(HostText(error.Source()));
     made->SetDescription(HostText(error.Description()));
     IErrorInfo* info = nullptr;
@@ -33,7 +36,7 @@ HRESULT Raised(Name className, Name member) noexcept
 {
     try {
         const Error error = CurrentError(std::string(className) + "." + std::string(member));
-        LeaveWithThread(error);
+        LeaveWithThread(error, className);
         return StatusOf(error.Number());
     } catch (...) { // no memory, not even for the words
         SetErrorInfo(0, nullptr);

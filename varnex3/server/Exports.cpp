@@ -9,11 +9,19 @@
 using namespace varnex3;
 using namespace varnex3::server;
 
-BOOL WINAPI DllMain(HINSTANCE, DWORD reason, LPVOID)
+namespace __gnu_cxx {
+
+void __freeres(); // of libstdc++, declared in no header: frees the memory that it sets aside for exceptions
+
+} // namespace __gnu_cxx
+
+BOOL WINAPI DllMain(HINSTANCE, DWORD reason, LPVOID processEnds)
 {
     const bool isLoaded = reason == DLL_PROCESS_ATTACH;
     if (const auto version = isLoaded ? Module::Version() : std::nullopt)
         RunningVersion() = *version;
+    if (reason == DLL_PROCESS_DETACH && !processEnds)
+        __gnu_cxx::__freeres();
     return TRUE;
 }
 

@@ -1,5 +1,6 @@
 #include <atomic>
 
+#include "tests/windows/Printing.h"
 #include "tests/windows/Thread.h"
 #include "tests/windows/early/EarlyBound.h"
 

@@ -2,7 +2,6 @@
 #pragma once
 
 #include "tests/windows/Automation.h"
-#include "tests/windows/Printing.h"
 
 #include <Varnex3.h>
 

@@ -1,5 +1,6 @@
 #include <climits>
 
+#include "tests/windows/Printing.h"
 #include "tests/windows/early/EarlyBound.h"
 
 using namespace varnex3::tests;
@@ -63,6 +64,20 @@ TEST_CASE("A date, a 32-bit integer, a Boolean and an enumeration go in and come
     CHECK(message->put_MessageTypeID(Xalo_Quote) == S_OK);
     CHECK(message->get_MessageTypeID(&type) == S_OK);
     CHECK(type == Xalo_Quote);
+}
+
+TEST_CASE("A double and a 16-bit integer go in and come out")
+{
+    const Apartment apartment;
+    const auto part = New<_QuoteItemPart>(CLSID_QuoteItemPart);
+    double amount = 0;
+    CHECK(part->put_PartValue(149.625) == S_OK);
+    CHECK(part->get_PartValue(&amount) == S_OK);
+    CHECK(amount == 149.625);
+    short quantity = 0;
+    CHECK(part->put_PartQuantity(SHRT_MIN) == S_OK);
+    CHECK(part->get_PartQuantity(&quantity) == S_OK);
+    CHECK(quantity == SHRT_MIN);
 }
 
 TEST_CASE("A Boolean of a host that is neither 0 nor -1 is True")

@@ -1,3 +1,4 @@
+#include "tests/windows/Printing.h"
 #include "tests/windows/Thread.h"
 #include "tests/windows/early/EarlyBound.h"
 
