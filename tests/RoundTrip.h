@@ -1,6 +1,7 @@
 // Messages that are written and read again: what comes back, and what a change loses on the way.
 #pragma once
 
+#include <initializer_list>
 #include <string>
 
 #include "tests/Printing.h"
@@ -53,6 +54,14 @@ Text SomeOf(Ref<Message> (*generated)(unsigned seed))
     for (unsigned seed = 0; seed < 200; ++seed)
         all += generated(seed)->Serialise();
     return all;
+}
+
+inline void CheckElements(const Text& all, std::initializer_list<const char*> elements)
+{
+    for (const char* const element : elements) {
+        CAPTURE(element);
+        CHECK(all.find(u"<" + ToUtf16(element) + u">") != Text::npos);
+    }
 }
 
 // The text of a message, and what that text becomes when it is read and written again.

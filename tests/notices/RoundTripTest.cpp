@@ -5,6 +5,7 @@
 #include "varnex3/notices/Xalo_VarnexVersionChange.h"
 
 using namespace varnex3;
+using tests::CheckElements;
 using tests::CheckRoundTrips;
 using tests::RaisedBy;
 using tests::RecordGenerator;
@@ -84,14 +85,6 @@ Trip TripOfDataType(Change change)
 {
     return TripOf<Xalo_VarnexReferenceData>(
         [&](Xalo_VarnexReferenceData& message) { change(*message.ReferenceDataField()->Add()); });
-}
-
-void CheckElements(const Text& all, std::initializer_list<const char*> elements)
-{
-    for (const char* const element : elements) {
-        CAPTURE(element);
-        CHECK(all.find(u"<" + ToUtf16(element) + u">") != Text::npos);
-    }
 }
 
 } // namespace

@@ -5,6 +5,7 @@
 #include "varnex3/outcomes/Xalo_PaymentDeclined.h"
 
 using namespace varnex3;
+using tests::CheckElements;
 using tests::CheckRoundTrips;
 using tests::RaisedBy;
 using tests::RecordGenerator;
@@ -47,14 +48,6 @@ template <class Message, class Change>
 bool IsNotWritten(Change change)
 {
     return TripOf<Message>(change).first == TripOf<Message>([](Message&) {}).first;
-}
-
-void CheckElements(const Text& all, std::initializer_list<const char*> elements)
-{
-    for (const char* const element : elements) {
-        CAPTURE(element);
-        CHECK(all.find(u"<" + ToUtf16(element) + u">") != Text::npos);
-    }
 }
 
 } // namespace

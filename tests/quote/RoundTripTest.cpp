@@ -4,6 +4,7 @@
 #include "varnex3/request/Xalo_RequestForQuote.h"
 
 using namespace varnex3;
+using tests::CheckElements;
 using tests::CheckRoundTrips;
 using tests::RaisedBy;
 using tests::RecordGenerator;
@@ -115,40 +116,37 @@ TEST_CASE("Request: ten thousand generated requests are read and written again a
 TEST_CASE("Generator: among the generated quotes every kind of item and every optional line comes up")
 {
     const Text all = SomeOf(Generated<Xalo_Quote>);
-    for (const TextView element : {u"QuoteNo",
-                                   u"QuoteDate",
-                                   u"VarnexStatus",
-                                   u"QuoteDetails",
-                                   u"OwnersContributionToCollect",
-                                   u"OpenText",
-                                   u"Vehicle",
-                                   u"VehicleDetails",
-                                   u"Odometer",
-                                   u"EngineSize",
-                                   u"HourlyRates",
-                                   u"Defines",
-                                   u"QuoteItems",
-                                   u"RemoveReplace",
-                                   u"Repair",
-                                   u"PaintLabour",
-                                   u"OtherPaintGroup",
-                                   u"PaintMaterials",
-                                   u"Part",
-                                   u"Aftermarket",
-                                   u"Exchange",
-                                   u"Used",
-                                   u"Miscellaneous",
-                                   u"Sublet",
-                                   u"Mechanical",
-                                   u"Towing",
-                                   u"Comment",
-                                   u"UpdateStatus",
-                                   u"Assessment",
-                                   u"Customer",
-                                   u"PersonalName"}) {
-        CAPTURE(tests::Visible(element));
-        CHECK(all.find(u"<" + Text(element) + u">") != Text::npos);
-    }
+    CheckElements(all, {"QuoteNo",
+                        "QuoteDate",
+                        "VarnexStatus",
+                        "QuoteDetails",
+                        "OwnersContributionToCollect",
+                        "OpenText",
+                        "Vehicle",
+                        "VehicleDetails",
+                        "Odometer",
+                        "EngineSize",
+                        "HourlyRates",
+                        "Defines",
+                        "QuoteItems",
+                        "RemoveReplace",
+                        "Repair",
+                        "PaintLabour",
+                        "OtherPaintGroup",
+                        "PaintMaterials",
+                        "Part",
+                        "Aftermarket",
+                        "Exchange",
+                        "Used",
+                        "Miscellaneous",
+                        "Sublet",
+                        "Mechanical",
+                        "Towing",
+                        "Comment",
+                        "UpdateStatus",
+                        "Assessment",
+                        "Customer",
+                        "PersonalName"});
     CHECK(all.find(u"<OEM PartNumber=") != Text::npos);
     CHECK(all.find(u"<ReportOn/>") != Text::npos);
 }
