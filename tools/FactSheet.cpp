@@ -11,7 +11,7 @@ Terminal& FactSheet::Begin()
     if (title.empty())
         return terminal;
     terminal.Line();
-    terminal.Line(terminal.Styled(Style::Heading, title));
+    terminal.Line(terminal.Styled(Style::Heading, Cut(title, terminal.Width())));
     title = {};
     return terminal;
 }

@@ -123,19 +123,6 @@ std::vector<Cell> RowOf(const QuoteItem& item)
             {Printable(item.Comment()), Style::Faint}};
 }
 
-// Columns without a value in any row.
-void RemoveEmptyColumns(std::vector<Column>& columns, std::vector<std::vector<Cell>>& rows)
-{
-    for (std::size_t i = columns.size(); i-- > 0;) {
-        if (std::ranges::any_of(rows, [i](const auto& row) { return !row[i].text.empty(); }))
-            continue;
-        const auto place = static_cast<std::ptrdiff_t>(i);
-        columns.erase(columns.begin() + place);
-        for (auto& row : rows)
-            row.erase(row.begin() + place);
-    }
-}
-
 // "3 items, 10.50 hours, 867.50".
 std::string InWords(std::size_t count, double hours, double value)
 {
@@ -147,20 +134,23 @@ std::string InWords(std::size_t count, double hours, double value)
 
 void PrintItems(FactSheet& sheet, QuoteItemsDef& items)
 {
-    std::vector<Column> columns = {{"No", 0, 90, true},     {"Code", 0, 40},        {"Description", 20, 100},
-                                   {"Kind", 0, 70},         {"Hours", 0, 60, true}, {"Rate", 0, 50, true},
-                                   {"Amount", 0, 55, true}, {"Value", 0, 95, true}, {"Detail", 8, 30},
-                                   {"Status", 5, 20},       {"Comment", 8, 10}};
-    std::vector<std::vector<Cell>> rows;
     const std::vector<Ref<QuoteItem>> all = AllOf(items);
-    for (const Ref<QuoteItem>& item : all)
-        rows.push_back(RowOf(*item));
-    if (rows.empty())
+    if (all.empty())
         return;
-    RemoveEmptyColumns(columns, rows);
-    Table table(std::move(columns));
-    for (std::vector<Cell>& row : rows)
-        table.Add(std::move(row));
+    Table table({{"No", 0, 90, true},
+                 {"Code", 0, 40},
+                 {"Description", 20, 100},
+                 {"Kind", 0, 70},
+                 {"Hours", 0, 60, true},
+                 {"Rate", 0, 50, true},
+                 {"Amount", 0, 55, true},
+                 {"Value", 0, 95, true},
+                 {"Detail", 8, 30},
+                 {"Status", 5, 20},
+                 {"Comment", 8, 10}});
+    for (const Ref<QuoteItem>& item : all)
+        table.Add(RowOf(*item));
+    table.RemoveEmptyColumns();
     table.Print(sheet.Begin());
     for (const Ref<QuoteItem>& item : all)
         if (IsSet(item->ErrorMessage()))

@@ -1,10 +1,12 @@
 #include "MessagePage.h"
 
-#include <algorithm>
-#include <utility>
-
+#include "AmountTable.h"
+#include "ErrorTable.h"
 #include "FactSheet.h"
 #include "ItemTable.h"
+#include "MessageOutput.h"
+#include "PropertyFacts.h"
+#include "ReferenceTables.h"
 #include "Summary.h"
 #include "varnex3/varnex3.h"
 
@@ -187,18 +189,56 @@ void Print(FactSheet& sheet, CustomerDef& customer)
 
 void Print(FactSheet& sheet, QuoteItemsDef& items) { PrintItems(sheet, items); }
 
-void Print(FactSheet& sheet, const std::vector<OwnValue>& values)
+void Print(FactSheet& sheet, PaymentDetailsDef& invoice)
 {
-    constexpr std::pair<Name, Name> labels[] = {{"QuoteDate", "Quote date"},
-                                                {"ImageCount", "Images"},
-                                                {"Defines", "Defines"},
-                                                {"InspectionReqested", "Inspection for"}};
-    for (const OwnValue& value : values) {
-        const auto label = std::ranges::find(labels, value.element, &std::pair<Name, Name>::first);
-        sheet.Fact(label->second, value.text);
-        if (value.error)
-            sheet.Failure(*value.error);
-    }
+    sheet.Fact("Invoice no", invoice.RepairerTaxInvoiceNo()); // its amounts are a table
+    sheet.Fact("Contribution for", invoice.OwnersContributionToCollect()->Reason());
+}
+
+void Print(FactSheet& sheet, ExpectedPaymentDetailsDef& expected)
+{
+    sheet.Fact("Contribution for", expected.OwnersContributionToCollect()->Reason());
+}
+
+void Print(FactSheet& sheet, ErrorDetailsDef& errors) { PrintErrors(sheet, errors); }
+
+void Print(FactSheet& sheet, ReferenceDataDef& data) { PrintReferenceData(sheet, data); }
+
+// Where no other words are needed than those of the properties.
+void Print(FactSheet& sheet, Record& record) { PrintProperties(sheet, record); }
+
+// Where the page tells an own value of a message, and what it calls it.
+struct OwnValuePlace
+{
+    Name part;
+    Name element;
+    Name label;
+};
+
+constexpr OwnValuePlace kOwnValues[] = {
+    {"Message", "RelatesToMessageNo", "About message"},
+    {"Message", "QuoteDate", "Quote date"},
+    {"Message", "ImageCount", "Images"},
+    {"Message", "Defines", "Defines"},
+    {"Message", "InspectionReqested", "Inspection for"},
+    {"Message", "ImageNo", "Image no"},
+    {"Message", "OpenText", "Remarks"},
+    {"Vehicle", "RegistrationNo", "Registration"},
+    {"Vehicle", "VehicleLocation", "Where"},
+    {"Invoice", "TaxInvoiceDate", "Invoice date"},
+    {"Invoice", "ReActivateInvoiceDate", "Reactivated"},
+    {"Outcome", "Reason", "Reason"},
+};
+
+void Print(FactSheet& sheet, const std::vector<OwnValue>& values, Name part)
+{
+    for (const OwnValuePlace& place : kOwnValues)
+        for (const OwnValue& value : values)
+            if (place.part == part && place.element == value.element) {
+                sheet.Fact(place.label, value.text);
+                if (value.error)
+                    sheet.Failure(*value.error);
+            }
 }
 
 // The facts of the section of a class, if the message has it.
@@ -221,23 +261,31 @@ void PrintSums(FactSheet& sheet, const std::vector<Section>& sections)
             PrintItemsByKind(sheet, static_cast<QuoteItemsDef&>(*section.record));
 }
 
-} // namespace
-
-bool HasPage(MessageDef& message)
+std::vector<AmountColumn> AmountsIn(const std::vector<Section>& sections)
 {
-    const XaloMessageTypeEnum type = message.MessageTypeID();
-    return type == XaloMessageTypeEnum::Xalo_RequestForQuote || type == XaloMessageTypeEnum::Xalo_Quote;
+    std::vector<AmountColumn> columns;
+    for (const Section& section : sections) {
+        if (&section.record->Class() == &PaymentDetailsDef::Info())
+            columns.push_back({"Invoiced", section.record, !section.error});
+        if (&section.record->Class() == &ExpectedPaymentDetailsDef::Info())
+            columns.push_back({"Expected", section.record, !section.error});
+    }
+    return columns;
 }
 
-void PrintPage(Terminal& terminal, const std::vector<OwnValue>& values, const std::vector<Section>& sections)
+void PrintEnvelope(FactSheet& sheet, const std::vector<OwnValue>& values, const std::vector<Section>& sections)
 {
-    FactSheet sheet(terminal);
     sheet.Part("Message");
     Print<SourceDef>(sheet, sections);
     Print<DestinationDef>(sheet, sections);
     Print<VersionDef>(sheet, sections);
+    Print<VersionChangeDef>(sheet, sections);
     Print<VarnexStatusDef>(sheet, sections);
-    Print(sheet, values);
+    Print(sheet, values, "Message");
+}
+
+void PrintJob(FactSheet& sheet, const std::vector<OwnValue>& values, const std::vector<Section>& sections)
+{
     sheet.Part("Insurer");
     Print<InsurerDef>(sheet, sections);
     sheet.Part("Repairer");
@@ -250,6 +298,11 @@ void PrintPage(Terminal& terminal, const std::vector<OwnValue>& values, const st
     Print<VehicleDef>(sheet, sections);
     Print<VehicleDetailsDef>(sheet, sections);
     Print<VehicleModsDef>(sheet, sections);
+    Print(sheet, values, "Vehicle");
+}
+
+void PrintRequestAndQuote(FactSheet& sheet, const std::vector<Section>& sections)
+{
     sheet.Part("Request");
     Print<RequestDetailsDef>(sheet, sections);
     sheet.Part("Quote");
@@ -264,6 +317,48 @@ void PrintPage(Terminal& terminal, const std::vector<OwnValue>& values, const st
     PrintSums(sheet, sections);
     sheet.Part("Totals");
     Print<TotalsDef>(sheet, sections);
+}
+
+void PrintOutcome(FactSheet& sheet, const std::vector<OwnValue>& values, const std::vector<Section>& sections)
+{
+    sheet.Part("Outcome");
+    Print<DeclinedDetailDef>(sheet, sections);
+    Print(sheet, values, "Outcome");
+    sheet.Part("Payment");
+    Print<PayAuthorityDetailsDef>(sheet, sections);
+    sheet.Part("Adjustment");
+    Print<AdjustmentNoteDetailsDef>(sheet, sections);
+    sheet.Part("Invoice");
+    Print<TaxInvoiceDetailsDef>(sheet, sections);
+    Print<PaymentDetailsDef>(sheet, sections);
+    Print(sheet, values, "Invoice");
+    sheet.Part("Expected");
+    Print<ExpectedPaymentDetailsDef>(sheet, sections);
+    sheet.Part("Amounts");
+    PrintAmounts(sheet, AmountsIn(sections));
+}
+
+void PrintNotice(FactSheet& sheet, const std::vector<Section>& sections)
+{
+    sheet.Part("Errors");
+    Print<ErrorDetailsDef>(sheet, sections);
+    sheet.Part("Reference data");
+    Print<ReferenceDataDef>(sheet, sections);
+}
+
+} // namespace
+
+bool HasPage(MessageDef& message) { return FindMessageClass(ToUtf8(message.MessageType())) != nullptr; }
+
+// A part without facts prints nothing, so that one order of parts does for every message.
+void PrintPage(Terminal& terminal, const std::vector<OwnValue>& values, const std::vector<Section>& sections)
+{
+    FactSheet sheet(terminal);
+    PrintEnvelope(sheet, values, sections);
+    PrintJob(sheet, values, sections);
+    PrintRequestAndQuote(sheet, sections);
+    PrintOutcome(sheet, values, sections);
+    PrintNotice(sheet, sections);
 }
 
 } // namespace varnex3::tool

@@ -45,11 +45,17 @@ void PrintChild(Terminal& terminal, std::size_t depth, Name name, const Ref<Reco
     const bool isNothing = !child || (IsListOfFields(child->Class()) && ToInt32(Get(*child, "Count")) == 0);
     if (isNothing)
         return PrintField(terminal, depth, name, {});
-    terminal.Line(Cut(std::string(depth * kIndent, ' ').append(name), terminal.Width()));
+    PrintGroup(terminal, depth, name);
     PrintRecord(terminal, depth + 1, *child);
 }
 
 } // namespace
+
+void PrintGroup(Terminal& terminal, std::size_t depth, std::string_view name)
+{
+    const std::size_t indent = std::min(depth * kIndent, terminal.Width() / 2);
+    terminal.Line(Cut(std::string(indent, ' ').append(name), terminal.Width()));
+}
 
 void PrintField(Terminal& terminal, std::size_t depth, std::string_view name, std::string_view value)
 {

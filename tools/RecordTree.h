@@ -13,6 +13,9 @@ namespace varnex3::tool {
 // shows as a hyphen.
 void PrintField(Terminal& terminal, std::size_t depth, std::string_view name, std::string_view value);
 
+// The name of what stands one step further in.
+void PrintGroup(Terminal& terminal, std::size_t depth, std::string_view name);
+
 // Every property of a record in interface order, those of its children one step further in. The members of a list of
 // named fields are its fields.
 void PrintRecord(Terminal& terminal, std::size_t depth, Record& record);

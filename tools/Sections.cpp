@@ -1,5 +1,8 @@
 #include "Sections.h"
 
+#include <algorithm>
+#include <iterator>
+
 #include "varnex3/varnex3.h"
 
 namespace varnex3::tool {
@@ -9,83 +12,99 @@ namespace {
 struct SectionClass
 {
     Name element;
-    const ClassInfo& info;
-    Name root = {}; // of the messages that have it; any when empty
+    Ref<Record> (*create)();
+    Name root = {};       // of the messages that have it; any when empty
+    bool isEvery = false; // see Section
 };
 
-Section Read(const SectionClass& entry, const xml::Node& node)
+template <class T>
+Ref<Record> Make()
 {
-    Section section{entry.element, entry.info.create(), {}};
+    return New<T>();
+}
+
+Ref<Record> MakeLastInvoice() { return NewLastInvoiceDetails(); }
+
+constexpr Name kRequest = Xalo_RequestForQuote::ClassName;
+constexpr Name kQuote = Xalo_Quote::ClassName;
+
+// In the order in which messages have them; a class for one kind of message before the one for all.
+constexpr SectionClass kClasses[] = {
+    {"Version", Make<VersionChangeDef>, Xalo_VarnexVersionChange::ClassName},
+    {"Version", Make<VersionDef>},
+    {"Source", Make<SourceDef>},
+    {"Destination", Make<DestinationDef>},
+    {"Insurer", Make<InsurerDef>},
+    {"Repairer", Make<RepairerDef>},
+    {"ClaimHeader", Make<ClaimHeaderDef>},
+    {"RequestDetails", Make<RequestDetailsDef>, kRequest},
+    {"VarnexStatus", Make<VarnexStatusDef>, kQuote},
+    {"QuoteDetails", Make<QuoteDetailsDef>, kQuote},
+    {"Vehicle", Make<VehicleDef>},
+    {"VehicleMods", Make<VehicleModsDef>, kRequest},
+    {"VehicleDetails", Make<VehicleDetailsDef>, kQuote},
+    {"HourlyRates", Make<HourlyRatesDef>, kQuote},
+    {"QuoteItems", Make<QuoteItemsDef>, kQuote},
+    {"Totals", Make<TotalsDef>, kQuote},
+    {"Assessment", Make<AssessmentDef>, kQuote},
+    {"Customer", Make<CustomerDef>},
+    {"TaxInvoiceDetail", Make<TaxInvoiceDetailsDef>, Xalo_TaxInvoice::ClassName},
+    {"AdjustmentNoteDetails", Make<AdjustmentNoteDetailsDef>, Xalo_AdjustmentNote::ClassName},
+    {"PaymentDetails", Make<PaymentDetailsDef>},
+    {"PayAuthorityDetails", Make<PayAuthorityDetailsDef>, Xalo_PaymentAuthorised::ClassName},
+    {"LastInvoiceDetails", MakeLastInvoice, Xalo_PaymentDeclined::ClassName},
+    {"ExpectedPaymentDetails", Make<ExpectedPaymentDetailsDef>, Xalo_PaymentDeclined::ClassName},
+    {"DeclinedDetail", Make<DeclinedDetailDef>, Xalo_Declined::ClassName},
+    {"ErrorDetails", Make<ErrorDetailsDef>, Xalo_Error::ClassName, true},
+    {"ReferenceData", Make<ReferenceDataDef>, Xalo_VarnexReferenceData::ClassName},
+};
+
+// The class for an element of this name below that root, or null.
+const SectionClass* ClassFor(const xml::Node& root, Name element)
+{
+    const auto* const found = std::ranges::find_if(kClasses, [&](const SectionClass& entry) {
+        return entry.element == element && (entry.root.empty() || root.IsElement(entry.root));
+    });
+    return found == std::end(kClasses) ? nullptr : found;
+}
+
+void ReadByRows(Record& record, const xml::Node& node)
+{
+    for (const Member& member : record.Class().members) {
+        if (!member.IsProperty() || !member.IsWritable())
+            continue;
+        if (const xml::Node value = node.FirstChildElement(member.name)) // a flag says yes by being there
+            Put(record, member.name, member.type.kind == Kind::Boolean ? Variant(true) : Variant(value.Text()));
+    }
+}
+
+void ReadInto(Section& section, const xml::Node& node)
+{
     try {
+        if (!FindMember(section.record->Class(), "ParseXML"))
+            return ReadByRows(*section.record, node);
         Variant markup = node.Xml();
         Call(*section.record, "ParseXML", {&markup, 1});
     } catch (const Error& error) {
-        section.error = error;
+        if (!section.error) // the first of several elements
+            section.error = error;
     }
-    return section;
-}
-
-// Why a quote could not read its own value of this name.
-std::optional<Error> WhyNotRead(const xml::Node& quote, Name element)
-{
-    const XmlSection section(quote, Xalo_Quote::ClassName);
-    try {
-        if (element == "QuoteDate")
-            section.TimestampAt("Xalo_Quote/QuoteDate");
-        if (element == "ImageCount")
-            section.Int16At("Xalo_Quote/ImageCount");
-    } catch (const Error& error) {
-        return error;
-    }
-    return std::nullopt;
 }
 
 } // namespace
 
-std::vector<OwnValue> ReadOwnValues(const xml::Document& document)
-{
-    const xml::Node root = document.DocumentElement();
-    std::vector<OwnValue> values;
-    if (!root.IsElement(Xalo_Quote::ClassName))
-        return values;
-    for (const Name element : {"QuoteDate", "ImageCount", "Defines"})
-        if (const xml::Node node = root.SelectSingle(element))
-            values.push_back({element, node.Text(), WhyNotRead(root, element)});
-    const xml::Node inspection = root.SelectSingle("InspectionReqested");
-    if (inspection && inspection.AttributeCount() > 0)
-        values.push_back({"InspectionReqested", inspection.AttributeAt(0).value, {}});
-    return values;
-}
-
 std::vector<Section> ReadSections(const xml::Document& document)
 {
-    constexpr Name kRequest = Xalo_RequestForQuote::ClassName;
-    constexpr Name kQuote = Xalo_Quote::ClassName;
-    const SectionClass classes[] = {
-        {"Version", VersionDef::Info()},
-        {"Source", SourceDef::Info()},
-        {"Destination", DestinationDef::Info()},
-        {"Insurer", InsurerDef::Info()},
-        {"Repairer", RepairerDef::Info()},
-        {"ClaimHeader", ClaimHeaderDef::Info()},
-        {"RequestDetails", RequestDetailsDef::Info(), kRequest},
-        {"VarnexStatus", VarnexStatusDef::Info(), kQuote},
-        {"QuoteDetails", QuoteDetailsDef::Info(), kQuote},
-        {"Vehicle", VehicleDef::Info()},
-        {"VehicleMods", VehicleModsDef::Info(), kRequest},
-        {"VehicleDetails", VehicleDetailsDef::Info(), kQuote},
-        {"HourlyRates", HourlyRatesDef::Info(), kQuote},
-        {"QuoteItems", QuoteItemsDef::Info(), kQuote},
-        {"Totals", TotalsDef::Info(), kQuote},
-        {"Assessment", AssessmentDef::Info(), kQuote},
-        {"Customer", CustomerDef::Info()},
-    };
     const xml::Node root = document.DocumentElement();
     std::vector<Section> sections;
-    for (const SectionClass& entry : classes) {
-        const xml::Node node = root.SelectSingle(entry.element);
-        if (node && (entry.root.empty() || root.IsElement(entry.root)))
-            sections.push_back(Read(entry, node));
+    for (const SectionClass& entry : kClasses) {
+        xml::Node node = root.FirstChildElement(entry.element);
+        if (!node || ClassFor(root, entry.element) != &entry)
+            continue;
+        Section& section = sections.emplace_back(Section{entry.element, entry.create(), {}, entry.isEvery});
+        do
+            ReadInto(section, node);
+        while (entry.isEvery && (node = node.NextSiblingElement(entry.element)));
     }
     return sections;
 }

@@ -7,6 +7,7 @@
 #include "DisplayText.h"
 #include "MessageFile.h"
 #include "MessagePage.h"
+#include "OwnValues.h"
 #include "RecordTree.h"
 #include "Sections.h"
 #include "SourceExcerpt.h"
@@ -50,12 +51,19 @@ enum class Extent
     Head // what the message is, not what it says
 };
 
+// The number that the summary has of an error report is another message's: the page says so.
+bool IsWanted(MessageDef& message, const SummaryField& field, Extent extent)
+{
+    const bool isOfOther = field.property == "MessageNo" && message.MessageTypeID() == XaloMessageTypeEnum::Xalo_Error;
+    return extent == Extent::Whole || (field.isHead && !isOfOther);
+}
+
 void PrintSummary(Terminal& terminal, MessageDef& message, Extent extent)
 {
     PrintField(terminal, 0, "File", Printable(message.FileName()));
     for (const SummaryField& field : SummaryFields()) {
         const Text value = InWords(message, field.property);
-        if (!value.empty() && (field.isHead || extent == Extent::Whole))
+        if (!value.empty() && IsWanted(message, field, extent))
             PrintField(terminal, 0, field.label, Printable(value));
     }
 }
@@ -70,6 +78,20 @@ void PrintSection(Terminal& terminal, const Section& section)
             terminal.Line("  " + terminal.Styled(Style::Bad, line));
 }
 
+// What a message holds and nothing else tells, as the tree that it is in the file.
+void PrintOthers(Terminal& terminal, const std::vector<ElementLine>& values)
+{
+    if (values.empty())
+        return;
+    terminal.Line();
+    terminal.Line(terminal.Styled(Style::Heading, "Also in the message"));
+    for (const ElementLine& value : values)
+        if (value.text)
+            PrintField(terminal, value.depth + 1, Printable(value.name), Printable(*value.text));
+        else
+            PrintGroup(terminal, value.depth + 1, Printable(value.name));
+}
+
 Json JsonOf(const Error& error)
 {
     return {{"number", error.Number()}, {"source", ToUtf8(error.Source())}, {"reason", ToUtf8(error.Description())}};
@@ -82,6 +104,17 @@ Json JsonOf(const std::vector<Section>& sections)
         Json& record = json[std::string(section.element)] = Json::parse(ToJson(*section.record));
         if (section.error)
             record["error"] = JsonOf(*section.error);
+    }
+    return json;
+}
+
+Json JsonOf(const std::vector<ElementLine>& values)
+{
+    Json json = Json::array();
+    for (const ElementLine& value : values) {
+        Json& line = json.emplace_back(Json{{"depth", value.depth}, {"element", ToUtf8(value.name)}});
+        if (value.text)
+            line["text"] = ToUtf8(*value.text);
     }
     return json;
 }
@@ -106,6 +139,55 @@ std::string ReadBytes(const Text& path)
 
 Text FileNameIn(const Text& path) { return path.substr(path.rfind(u'/') + 1); }
 
+// All that a file says below its root.
+struct Content
+{
+    explicit Content(const xml::Document& document)
+        : sections(ReadSections(document)), values(ReadOwnValues(document)), others(ReadOtherValues(document, sections))
+    {}
+
+    bool IsRead() const
+    {
+        const auto hasError = [](const auto& part) { return part.error.has_value(); };
+        return std::ranges::none_of(sections, hasError) && std::ranges::none_of(values, hasError);
+    }
+
+    std::vector<Section> sections;
+    std::vector<OwnValue> values;
+    std::vector<ElementLine> others;
+};
+
+void PrintJson(Terminal& terminal, const MessageFile& file, const Content& content)
+{
+    Json json = tool::JsonOf(file);
+    AddOwnValues(json, content.values);
+    json["sections"] = JsonOf(content.sections);
+    if (!content.others.empty())
+        json["others"] = JsonOf(content.others);
+    terminal.Line(JsonLine(json));
+}
+
+void PrintTree(Terminal& terminal, MessageDef& message, const Content& content)
+{
+    PrintSummary(terminal, message, Extent::Whole);
+    for (const Section& section : content.sections)
+        PrintSection(terminal, section);
+    std::vector<ElementLine> others;
+    for (const OwnValue& value : content.values)
+        others.push_back({0, ToText(value.element), value.text});
+    others.insert(others.end(), content.others.begin(), content.others.end());
+    PrintOthers(terminal, others);
+}
+
+void PrintWhole(Terminal& terminal, MessageDef& message, const Content& content)
+{
+    if (!HasPage(message))
+        return PrintTree(terminal, message, content);
+    PrintSummary(terminal, message, Extent::Head);
+    PrintPage(terminal, content.values, content.sections);
+    PrintOthers(terminal, content.others);
+}
+
 } // namespace
 
 Status Show(const ShowOptions& options, const Console& console)
@@ -114,28 +196,16 @@ Status Show(const ShowOptions& options, const Console& console)
     const std::string bytes = ReadBytes(path);
     xml::Document document;
     document.LoadBytes(bytes);
-    const std::vector<Section> sections = ReadSections(document);
-    const std::vector<OwnValue> values = ReadOwnValues(document);
+    const Content content(document);
     const MessageFile file(std::move(document), FileNameIn(path), path);
 
-    if (options.isJson) {
-        Json json = tool::JsonOf(file);
-        AddOwnValues(json, values);
-        json["sections"] = JsonOf(sections);
-        console.out.Line(JsonLine(json));
-    } else if (file.IsBroken()) {
+    if (options.isJson)
+        PrintJson(console.out, file, content);
+    else if (file.IsBroken())
         PrintFault(console.out, file, bytes);
-    } else if (HasPage(*file.message)) {
-        PrintSummary(console.out, *file.message, Extent::Head);
-        PrintPage(console.out, values, sections);
-    } else {
-        PrintSummary(console.out, *file.message, Extent::Whole);
-        for (const Section& section : sections)
-            PrintSection(console.out, section);
-    }
-    const auto hasError = [](const auto& part) { return part.error.has_value(); };
-    const bool isRead = std::ranges::none_of(sections, hasError) && std::ranges::none_of(values, hasError);
-    return file.IsFine() && isRead ? Status::Fine : Status::Findings;
+    else
+        PrintWhole(console.out, *file.message, content);
+    return file.IsFine() && content.IsRead() ? Status::Fine : Status::Findings;
 }
 
 } // namespace varnex3::tool

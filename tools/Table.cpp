@@ -47,6 +47,18 @@ Table::Table(std::vector<Column> columns_) : columns(std::move(columns_)) {}
 
 void Table::Add(std::vector<Cell> row) { rows.push_back(std::move(row)); }
 
+void Table::RemoveEmptyColumns()
+{
+    for (std::size_t i = columns.size(); i-- > 0;) {
+        if (std::ranges::any_of(rows, [i](const auto& row) { return !row[i].text.empty(); }))
+            continue;
+        const auto place = static_cast<std::ptrdiff_t>(i);
+        columns.erase(columns.begin() + place);
+        for (auto& row : rows)
+            row.erase(row.begin() + place);
+    }
+}
+
 Table::Widths Table::NaturalWidths() const
 {
     Widths widths;
@@ -86,7 +98,28 @@ std::size_t Table::LeaveOut(Widths& widths, std::size_t available) const
     return byImportance.back();
 }
 
+std::vector<std::vector<Cell>> Table::LinesOf(const std::vector<Cell>& row, const Widths& widths) const
+{
+    std::vector<std::vector<Cell>> lines = {row};
+    for (std::size_t i = 0; i < row.size(); ++i) {
+        if (!columns[i].isWrapped || widths[i] == 0)
+            continue;
+        const std::vector<std::string> texts = Wrapped(row[i].text, widths[i]);
+        if (lines.size() < texts.size())
+            lines.resize(texts.size(), std::vector<Cell>(row.size()));
+        for (std::size_t k = 0; k < texts.size(); ++k)
+            lines[k][i] = {texts[k], row[i].style};
+    }
+    return lines;
+}
+
 void Table::PrintRow(Terminal& terminal, const std::vector<Cell>& row, const Widths& widths) const
+{
+    for (const std::vector<Cell>& line : LinesOf(row, widths))
+        PrintLine(terminal, line, widths);
+}
+
+void Table::PrintLine(Terminal& terminal, const std::vector<Cell>& row, const Widths& widths) const
 {
     std::string line;
     std::size_t blanks = 0; // written only once something follows: no blanks end a line

@@ -15,6 +15,7 @@ struct Column
     std::size_t leastWidth = 0; // it is left out rather than cut further; 0 when it must not be cut
     int importance = 0;         // the lowest goes first
     bool isNumber = false;      // set to the right
+    bool isWrapped = false;     // a longer text goes on below itself, nothing of it is cut off
 };
 
 struct Cell
@@ -31,6 +32,9 @@ public:
     // A cell for every column.
     void Add(std::vector<Cell> row);
 
+    // Takes away the columns without a text in any row.
+    void RemoveEmptyColumns();
+
     void Print(Terminal& terminal) const;
 
 private:
@@ -43,7 +47,11 @@ private:
     // Leaves out the least important columns until the rest fits, but for the most important one, which it returns.
     std::size_t LeaveOut(Widths& widths, std::size_t available) const;
 
+    // The lines that a row takes.
+    std::vector<std::vector<Cell>> LinesOf(const std::vector<Cell>& row, const Widths& widths) const;
+
     void PrintRow(Terminal& terminal, const std::vector<Cell>& row, const Widths& widths) const;
+    void PrintLine(Terminal& terminal, const std::vector<Cell>& line, const Widths& widths) const;
 
     std::vector<Column> columns;
     std::vector<std::vector<Cell>> rows;

@@ -466,22 +466,22 @@ class IdentifyTest(ToolTest):
 class ShowTest(ToolTest):
     REQUEST = str(SAMPLES / "job-4711-1-request.xml")
     QUOTE = str(SAMPLES / "job-4711-2-quote.xml")
-    INVOICE = str(SAMPLES / "job-4711-5-tax-invoice.xml")
+    WITHOUT_CLASS = str(SAMPLES / "total-loss.xml")  # a type that there is no page for
 
     def test_the_summary_and_every_section_that_has_a_class(self):
-        """show: the summary, then each section with its properties by name and value, children inside"""
-        done = run("show", self.INVOICE)
+        """show: of another message the summary, then each section with its properties by name and value"""
+        done = run("show", self.WITHOUT_CLASS)
         self.assertEqual((FINE, ""), (done.status, done.errors))
-        self.assertRegex(done.out, r"(?m)^Type +Tax Invoice$")
-        sections = re.findall(r"(?m)^\n(\w+)$", done.out)
-        self.assertEqual(["Version", "Source", "Destination", "Insurer", "Repairer", "ClaimHeader", "Vehicle"],
-                         sections[:7])
-        self.assertRegex(done.out, r"(?m)^  Make +Brolga$")
-        self.assertRegex(done.out, r"(?m)^  RepairerDetails\n    Suburb +Wattlebank\n    Phone +\(02\) 5550 5568$")
+        self.assertRegex(done.out, r"(?m)^Type +Total Loss$")
+        self.assertEqual(["Version", "Source", "Destination", "Insurer", "Repairer", "ClaimHeader", "Vehicle",
+                          "Customer", "Also in the message"], re.findall(r"(?m)^\n(\w+(?: \w+)*)$", done.out))
+        self.assertRegex(done.out, r"(?m)^  Make +Merindah$")
+        self.assertRegex(done.out, r"(?m)^  RepairerDetails\n    Suburb +Upper Tarrago\n    Phone +\(02\) 5550 2124$")
+        self.assertRegex(done.out, r"(?m)^  TotalLossDetails\n    DeterminedDate +2008-09-29$")
 
     def test_values_stand_below_each_other(self):
         """show: all values start in the same column"""
-        for path in (self.INVOICE, self.REQUEST):
+        for path in (self.WITHOUT_CLASS, self.REQUEST):
             out = run("show", path).out
             names = re.findall(r"(?m)^ *\w+(?: \w+)*  +", out)
             self.assertGreater(len(names), 25)
@@ -489,7 +489,7 @@ class ShowTest(ToolTest):
 
     def test_a_property_without_a_value_is_listed(self):
         """show: a property without a value is listed with a hyphen"""
-        self.assertRegex(run("show", self.INVOICE).out, r"(?m)^  EquipmentLevel +-$")
+        self.assertRegex(run("show", self.WITHOUT_CLASS).out, r"(?m)^  EquipmentLevel +-$")
 
     def assert_facts(self, out, part, facts):
         """The part has these facts, in this order, and no others."""
@@ -600,12 +600,12 @@ class ShowTest(ToolTest):
 
     def test_an_absent_section_is_not_shown(self):
         """show: a section that the message does not have is not shown"""
-        self.assertNotIn("\nVehicle\n", run("show", str(SAMPLES / "declined.xml")).out)
+        self.assertNotIn("\nVehicle\n", run("show", str(SAMPLES / "job-cancelled.xml")).out)
 
     def test_a_section_that_its_class_cannot_read_is_a_finding(self):
         """show: what keeps a class from reading its section is told, with what was read before; status 1"""
-        path = self.write("x.xml", "<Xalo_TaxInvoice><Source><OrgType>REP</OrgType></Source>"
-                                   "<Vehicle><Make>Brolga</Make></Vehicle></Xalo_TaxInvoice>")
+        path = self.write("x.xml", "<Xalo_TotalLoss><Source><OrgType>REP</OrgType></Source>"
+                                   "<Vehicle><Make>Brolga</Make></Vehicle></Xalo_TotalLoss>")
         done = run("show", path)
         self.assertEqual((FINDINGS, ""), (done.status, done.errors))
         self.assertRegex(done.out, r"(?m)^  OrgType +REP$")
