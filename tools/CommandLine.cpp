@@ -37,6 +37,7 @@ constexpr const char* kIdentifyExamples = R"(Examples:
 
 constexpr const char* kShowExamples = R"(Examples:
   varnex3 show inbox/job-4711-2-quote.xml
+  varnex3 show inbox/job-4822-6-payment-declined.xml
   varnex3 show broken.xml
   varnex3 show --json quote.xml | jq .sections.Vehicle)";
 
