@@ -102,6 +102,7 @@ std::vector<Ref<QuoteItem>> AllOf(QuoteItemsDef& items)
 {
     std::vector<Ref<QuoteItem>> all;
     const std::int32_t reachable = std::min<std::int32_t>(items.Count(), std::numeric_limits<std::int16_t>::max() + 1);
+    all.reserve(static_cast<std::size_t>(reachable));
     for (std::int32_t i = 0; i < reachable; ++i)
         all.push_back(items.QuoteItems(static_cast<std::int16_t>(i)));
     return all;
