@@ -89,6 +89,8 @@ void PrintErrors(FactSheet& sheet, ErrorDetailsDef& errors)
         return;
     table.RemoveEmptyColumns();
     table.Print(sheet.Begin());
+    if (errors.Count() > number)
+        sheet.Fact("More", ToText(Variant(errors.Count() - number)));
 }
 
 } // namespace varnex3::tool

@@ -24,6 +24,17 @@ auto ItemsOf(List& list)
     return items;
 }
 
+// Why those are not all: there are more than a count can say.
+template <class List>
+void PrintWhatIsMissing(FactSheet& sheet, const List& list)
+{
+    try {
+        static_cast<void>(list.Count());
+    } catch (const Error& error) {
+        sheet.Fact("More", error.Description());
+    }
+}
+
 void PrintType(FactSheet& sheet, ReferenceDataDefDataType& type)
 {
     const auto values = ItemsOf(type);
@@ -37,6 +48,7 @@ void PrintType(FactSheet& sheet, ReferenceDataDefDataType& type)
     for (const auto& value : values)
         table.Add({{Printable(value->Code())}, {Printable(value->Description())}});
     table.Print(terminal);
+    PrintWhatIsMissing(sheet, type);
 }
 
 } // namespace
@@ -48,6 +60,7 @@ void PrintReferenceData(FactSheet& sheet, ReferenceDataDef& data)
         sheet.Fact("Data types", u"none");
     for (const auto& type : types)
         PrintType(sheet, *type);
+    PrintWhatIsMissing(sheet, data);
 }
 
 } // namespace varnex3::tool

@@ -97,11 +97,21 @@ Json JsonOf(const Error& error)
     return {{"number", error.Number()}, {"source", ToUtf8(error.Source())}, {"reason", ToUtf8(error.Description())}};
 }
 
+// A list of more records than a count can say has no JSON.
+Json JsonOf(Record& record)
+{
+    try {
+        return Json::parse(ToJson(record));
+    } catch (const Error& error) {
+        return {{"error", JsonOf(error)}};
+    }
+}
+
 Json JsonOf(const std::vector<Section>& sections)
 {
     Json json = Json::object();
     for (const Section& section : sections) {
-        Json& record = json[std::string(section.element)] = Json::parse(ToJson(*section.record));
+        Json& record = json[std::string(section.element)] = JsonOf(*section.record);
         if (section.error)
             record["error"] = JsonOf(*section.error);
     }

@@ -128,7 +128,8 @@ class PageTest(tools.ToolTest):
                       "  Survey\n    @by                 web\n    Stars               5\n", done.out)
         others = tools.json_lines("show", self.write("message.xml", text))[0]["others"]
         self.assertEqual({"depth": 1, "element": "Keys", "text": "2"}, others[1])
-        self.assertEqual([{"depth": 0, "element": "Survey"}, {"depth": 1, "element": "@by", "text": "web"}], others[4:6])
+        self.assertEqual([{"depth": 0, "element": "Survey"}, {"depth": 1, "element": "@by", "text": "web"}],
+                         others[4:6])
 
     def test_a_file_may_be_nested_as_deep_as_it_likes(self):
         """show: elements that no class reads, 100,000 levels deep"""
@@ -136,6 +137,19 @@ class PageTest(tools.ToolTest):
         self.assertEqual(FINE, done.status)
         self.assert_no_line_is_wider(done.out, 80)
         self.assertRegex(done.out, r"a +end\n$")
+
+    def test_a_list_that_is_longer_than_positions_reach(self):
+        """show: of more than 32,768 errors or codes those that a position reaches, and that there are more"""
+        errors = 32_770 * "<ErrorDetails><Severity>E</Severity></ErrorDetails>"
+        page = self.show(f"<Xalo_Error>{errors}</Xalo_Error>").out.splitlines()
+        self.assertEqual(["32768  E", "  More                  2"], page[-2:])
+        codes = 32_770 * "<DataValue><Code>A</Code></DataValue>"
+        text = (f"<Xalo_VarnexReferenceData><ReferenceData><DataType n='T'>{codes}</DataType></ReferenceData>"
+                "</Xalo_VarnexReferenceData>")
+        self.assertEqual("  More                  the count 32770 is outside the range of a 16-bit integer",
+                         self.show(text).out.splitlines()[-1])
+        shown, = tools.json_lines("show", self.write("message.xml", text))
+        self.assertEqual(6, shown["sections"]["ReferenceData"]["error"]["number"])
 
     def test_a_narrow_terminal(self):
         """show: no page is wider than the terminal, or has a line that ends with a blank"""
@@ -149,8 +163,8 @@ class PageTest(tools.ToolTest):
     def test_json_has_what_is_only_written(self):
         """show --json: sections of classes that are only written, and the values beside the sections"""
         shown, = tools.json_lines("show", str(SAMPLES / "job-4711-5-tax-invoice.xml"))
-        self.assertEqual({"TaxInvoice": True, "CompletionDate": "2008-03-17T00:00:00", "Description": "Repairs as authorised"},
-                         shown["sections"]["TaxInvoiceDetail"])
+        self.assertEqual({"TaxInvoice": True, "CompletionDate": "2008-03-17T00:00:00",
+                          "Description": "Repairs as authorised"}, shown["sections"]["TaxInvoiceDetail"])
         self.assertEqual(("2008-03-18", "Keys with the front desk"), (shown["TaxInvoiceDate"], shown["OpenText"]))
         self.assertNotIn("others", shown)
 
@@ -177,11 +191,15 @@ class PageTest(tools.ToolTest):
 
     def test_a_detail_of_two_kinds_and_one_of_none(self):
         """show: an error detail takes a line for each of its kinds; one without any has its severity"""
-        out = self.show("<Xalo_Error><ErrorDetails><Severity>E</Severity><MessageTypeError><Description>Type</Description>"
-                        "</MessageTypeError><MiscellaneousError><Description>Other</Description></MiscellaneousError>"
-                        "</ErrorDetails><ErrorDetails><Severity>W</Severity></ErrorDetails></Xalo_Error>").out
-        self.assertTrue(out.endswith("Errors\nNo  Severity  Kind           Description\n 1  E         Message type   Type\n"
-                                     "    E         Miscellaneous  Other\n 2  W\n"), out)
+        out = self.show("<Xalo_Error><ErrorDetails><Severity>E</Severity>"
+                        "<MessageTypeError><Description>Type</Description></MessageTypeError>"
+                        "<MiscellaneousError><Description>Other</Description></MiscellaneousError></ErrorDetails>"
+                        "<ErrorDetails><Severity>W</Severity></ErrorDetails></Xalo_Error>").out
+        self.assertEqual(["Errors",
+                          "No  Severity  Kind           Description",
+                          " 1  E         Message type   Type",
+                          "    E         Miscellaneous  Other",
+                          " 2  W"], out.splitlines()[-5:])
 
 
 class SeverityTest(test_doctor.DoctorTest):
