@@ -1,5 +1,7 @@
 #include "AmountTable.h"
 
+#include <cmath>
+#include <limits>
 #include <utility>
 
 #include "PropertyFacts.h"
@@ -26,6 +28,13 @@ double AmountOf(Record& record, Name property)
 
 bool IsTotal(Name property) { return property.starts_with("Total"); }
 
+// Expected less invoiced, if both are known and their difference is a number.
+std::string Difference(const std::vector<double>& known)
+{
+    const double difference = known.size() == 2 ? known[1] - known[0] : std::numeric_limits<double>::infinity();
+    return std::isfinite(difference) ? ToUtf8(FormatAmount(difference)) : std::string();
+}
+
 // What is known of an amount; nothing when no column has it, unless it is a total.
 std::vector<Cell> RowOf(const std::vector<AmountColumn>& columns, Name property)
 {
@@ -41,7 +50,7 @@ std::vector<Cell> RowOf(const std::vector<AmountColumn>& columns, Name property)
         isTold = isTold || amount != 0;
     }
     if (columns.size() == 2)
-        row.push_back({known.size() == 2 ? ToUtf8(FormatAmount(known[1] - known[0])) : std::string()});
+        row.push_back({Difference(known)});
     return isTold ? row : std::vector<Cell>();
 }
 

@@ -4,6 +4,7 @@
 #include <iterator>
 #include <limits>
 #include <set>
+#include <string>
 #include <utility>
 
 #include "varnex3/Library.h"
@@ -15,14 +16,25 @@ namespace {
 // What is in lists; everything else that classes read is called like a property or a constant.
 constexpr Name kItemNames[] = {"QuoteItem", "DataType", "DataValue", "DamagedArea", "VehicleMod"};
 
+// Each attribute is found by walking to it, so of very many only these are listed, and the number of the others.
+constexpr std::size_t kListedAttributes = 100;
+
+void AddAttributes(std::vector<ElementLine>& lines, std::size_t depth, const xml::Node& element)
+{
+    const std::size_t count = element.AttributeCount();
+    for (std::size_t i = 0; i < std::min(count, kListedAttributes); ++i) {
+        xml::Attribute attribute = element.AttributeAt(i);
+        lines.push_back({depth, u"@" + attribute.name, std::move(attribute.value)});
+    }
+    if (count > kListedAttributes)
+        lines.push_back({depth, u"@", ToUtf16(std::to_string(count - kListedAttributes) + " more")});
+}
+
 void AddLine(std::vector<ElementLine>& lines, std::size_t depth, const xml::Node& element)
 {
     const bool isGroup = static_cast<bool>(FirstElementFrom(element.FirstChild()));
     lines.push_back({depth, element.Name(), isGroup ? std::nullopt : std::optional(element.Text())});
-    for (std::size_t i = 0; i < element.AttributeCount(); ++i) {
-        xml::Attribute attribute = element.AttributeAt(i);
-        lines.push_back({depth + 1, u"@" + attribute.name, std::move(attribute.value)});
-    }
+    AddAttributes(lines, depth + 1, element);
 }
 
 // The names of a class's properties, of the constants that they may have, and the same of the records in them.

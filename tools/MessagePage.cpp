@@ -145,6 +145,7 @@ void Print(FactSheet& sheet, VehicleDetailsDef& details)
 void Print(FactSheet& sheet, VehicleModsDef& mods)
 {
     std::vector<Text> all;
+    all.reserve(static_cast<std::size_t>(mods.Count()));
     for (std::int32_t i = 0; i < mods.Count(); ++i)
         all.push_back(mods.VehicleMods(i));
     sheet.List("Modifications", all);

@@ -138,6 +138,12 @@ class PageTest(tools.ToolTest):
         self.assert_no_line_is_wider(done.out, 80)
         self.assertRegex(done.out, r"a +end\n$")
 
+    def test_very_many_attributes(self):
+        """show: of an element with very many attributes that no class reads the first hundred, and how many more"""
+        attributes = " ".join(f"a{i}='{i}'" for i in range(50_000))
+        page = self.show(f"<Xalo_Image><Photo {attributes}/></Xalo_Image>").out.splitlines()
+        self.assertEqual(["    @a99                99", "    @                   49900 more"], page[-2:])
+
     def test_a_list_that_is_longer_than_positions_reach(self):
         """show: of more than 32,768 errors or codes those that a position reaches, and that there are more"""
         errors = 32_770 * "<ErrorDetails><Severity>E</Severity></ErrorDetails>"
