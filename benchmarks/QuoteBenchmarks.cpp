@@ -2,8 +2,13 @@
 
 #include <benchmark/benchmark.h>
 
+#include <stdexcept>
+
+#include "ExpatQuote.h"
+#include "GsoapQuote.h"
 #include "LibxmlQuote.h"
 #include "PugixmlQuote.h"
+#include "XsdcxxQuote.h"
 #include "varnex3/quote/Xalo_Quote.h"
 #include "varnex3/xml/Files.h"
 #include "varnex3/xml/Unicode.h"
@@ -51,8 +56,20 @@ std::size_t CountOf(const Ref<Xalo_Quote>& quote)
     return static_cast<std::size_t>(quote->QuoteItemsField()->Count());
 }
 
+// A peer that reads less than the others would be measured as quick.
+void RequireSameReading(const Sample& sample)
+{
+    auto expected = ReadWithPugixml(sample.utf8);
+    auto byLibxml = ReadWithLibxml(sample.utf8);
+    auto byExpat = ReadWithExpat(sample.utf8);
+    const std::string text = WriteWithPugixml(expected);
+    if (WriteWithPugixml(byLibxml) != text || WriteWithPugixml(byExpat) != text)
+        throw std::runtime_error("the peers do not read the same");
+}
+
 void RegisterReading(const Sample& sample)
 {
+    RequireSameReading(sample);
     Register("read/varnex3" + sample.size, [sample] { return CountOf(Read(sample.utf16)) == sample.items; });
     Register("read/pugixml-8" + sample.size,
              [sample] { return ReadWithPugixml(sample.utf8).items.size() == sample.items; });
@@ -60,6 +77,9 @@ void RegisterReading(const Sample& sample)
              [sample] { return ReadWithPugixml(sample.utf16).items.size() == sample.items; });
     Register("read/libxml2" + sample.size,
              [sample] { return ReadWithLibxml(sample.utf8).items.size() == sample.items; });
+    Register("read/gsoap" + sample.size, [sample] { return GsoapQuote(sample.utf8).ItemCount() == sample.items; });
+    Register("read/xsdcxx" + sample.size, [sample] { return XsdcxxQuote(sample.utf8).ItemCount() == sample.items; });
+    Register("read/expat" + sample.size, [sample] { return ReadWithExpat(sample.utf8).items.size() == sample.items; });
 }
 
 void RegisterWriting(const Sample& sample)
@@ -85,12 +105,15 @@ void RegisterBoth(const Sample& sample)
         auto model = ReadWithLibxml(sample.utf8);
         return WriteWithLibxml(model).size() > least;
     });
+    Register("both/gsoap" + sample.size, [sample, least] { return GsoapQuote(sample.utf8).Write().size() > least; });
+    Register("both/xsdcxx" + sample.size, [sample, least] { return XsdcxxQuote(sample.utf8).Write().size() > least; });
 }
 
 } // namespace
 
 void RegisterQuote(const std::string& folder, int items)
 {
+    static const XercesInUse xerces;
     const Sample sample = Load(folder, items);
     RegisterReading(sample);
     RegisterWriting(sample);
