@@ -56,7 +56,7 @@ Ref<Record> ReadXml(std::string_view bytes)
     if (!CanRead(*info))
         Raise(ErrorNumber::InvalidArgument, kOperation, u"a message of the type " + root + u" can only be written");
 
-    const Ref<Record> message = info->create();
+    Ref<Record> message = info->create();
     Variant text = DecodeFileText(bytes);
     Call(*message, "ParseXML", {&text, 1});
     return message;

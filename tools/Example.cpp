@@ -295,7 +295,7 @@ void Fill(Record& record, std::size_t position)
 
 Ref<Record> ExampleOf(const ClassInfo& info)
 {
-    const Ref<Record> record = info.create();
+    Ref<Record> record = info.create();
     Fill(*record, 0);
     return record;
 }

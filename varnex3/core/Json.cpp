@@ -287,6 +287,7 @@ void AddValues(Record& list, const Member& add, const Json& object, const std::s
                        + u" do not have the same number of items");
     for (std::size_t i = 0; i < columns[0].items.size(); ++i) {
         std::vector<Variant> arguments;
+        arguments.reserve(columns.size());
         for (const auto& [member, items] : columns)
             arguments.push_back(ValueFrom(member->type, items[i], Below(path, member->name, i)));
         At(Below(path, columns[0].member->name, i), [&] { return Call(list, add.name, arguments); });
@@ -369,7 +370,7 @@ Ref<Record> FromNamedJson(std::string_view json, const ClassInfo* (*find)(Name))
     const ClassInfo* const info = find(name);
     if (!info || info->IsModule())
         Refuse(ErrorNumber::NoSuchMember, {}, u"there is no class " + Quoted(ToUtf16(name)));
-    const Ref<Record> record = info->create();
+    Ref<Record> record = info->create();
     Fill(*record, named.front(), name);
     return record;
 }
