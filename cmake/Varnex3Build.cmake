@@ -13,6 +13,7 @@ target_include_directories(varnex3_build INTERFACE ${PROJECT_SOURCE_DIR})
 target_compile_options(varnex3_build INTERFACE
     -Wall -Wextra -Wpedantic -Wconversion -Wsign-conversion -Wnon-virtual-dtor -Wold-style-cast
     -Wcast-align -Woverloaded-virtual
+    $<$<CXX_COMPILER_ID:GNU>:-fno-semantic-interposition> # nobody replaces our functions: they may be inlined
     $<$<CXX_COMPILER_ID:GNU>:-Wshadow=local>
     $<$<CXX_COMPILER_ID:GNU>:-Wno-restrict> # false alarms of g++ 12 on u"literal" + text
     $<$<CXX_COMPILER_ID:Clang>:-Wshadow>)
