@@ -1,5 +1,6 @@
 #include "varnex3/core/Conversions.h"
 
+#include <algorithm>
 #include <array>
 #include <charconv>
 #include <cmath>
@@ -123,36 +124,34 @@ bool IsTooSmall(std::string_view form)
     return place + (hasNegativeExponent ? -exponent : exponent) < 0;
 }
 
-// The number of a text that is digits with at most one point among them; nothing for every other text. A quotient of
-// two numbers that are exact is rounded once, so the result is the nearest double, as that of from_chars.
-std::optional<double> TryPlainNumber(TextView text)
+// Takes the number of a text that is digits with at most one point among them; false for every other text. A quotient
+// of two numbers that are exact is rounded once, so the result is the nearest double, as that of from_chars.
+bool TakePlainNumber(TextView text, double& number)
 {
     constexpr std::size_t kMostExactDigits = 15;
-    constexpr double kPowers[] = {1e0, 1e1, 1e2, 1e3, 1e4, 1e5, 1e6, 1e7, 1e8, 1e9, 1e10, 1e11, 1e12, 1e13, 1e14, 1e15};
-    if (text.size() > kMostExactDigits)
-        return std::nullopt;
+    constexpr double kPowers[] = {1e0, 1e1, 1e2, 1e3, 1e4, 1e5, 1e6, 1e7, 1e8, 1e9, 1e10, 1e11, 1e12, 1e13, 1e14};
+    if (text.empty() || text.size() > kMostExactDigits)
+        return false;
     std::int64_t digits = 0;
-    std::size_t count = 0;
-    std::size_t point = text.size();
-    for (std::size_t i = 0; i < text.size(); ++i) {
-        if (IsDigit(text[i])) {
+    const auto takeDigits = [&](std::size_t i) {
+        for (; i < text.size() && IsDigit(text[i]); ++i)
             digits = digits * 10 + (text[i] - u'0');
-            ++count;
-        } else if (text[i] == u'.' && point == text.size()) {
-            point = i + 1;
-        } else {
-            return std::nullopt;
-        }
+        return i;
+    };
+    std::size_t fraction = takeDigits(0);
+    if (fraction < text.size()) {
+        ++fraction; // the point
+        if (text[fraction - 1] != u'.' || text.size() == 1 || takeDigits(fraction) < text.size())
+            return false;
     }
-    if (count == 0)
-        return std::nullopt;
-    return static_cast<double>(digits) / kPowers[text.size() - point];
+    number = static_cast<double>(digits) / kPowers[text.size() - fraction];
+    return true;
 }
 
 // Nothing when the text does not have the form of a number.
 std::optional<double> TryNumber(TextView text)
 {
-    if (const std::optional<double> plain = TryPlainNumber(text))
+    if (double plain = 0; TakePlainNumber(text, plain))
         return plain;
     const std::optional<std::string> form = NumberForm(text);
     if (!form)
@@ -208,6 +207,8 @@ Text Decimal(T value)
 
 double NumberFrom(TextView text)
 {
+    if (double plain = 0; TakePlainNumber(text, plain)) // most are, and the others take longer
+        return plain;
     if (const std::optional<double> number = TryNumber(text))
         return *number;
     Mismatch(text, u"a number");
@@ -329,8 +330,7 @@ bool NumberText::PutAmount(double amount)
         return false;
 
     value += rest > 0.5 ? 1 : 0;
-    Put(static_cast<char>('0' + value % 10));
-    Put(static_cast<char>('0' + value / 10 % 10));
+    PutPair(value % 100);
     Put('.');
     PutDigits(value / 100);
     if (amount < 0 && value > 0)
@@ -338,13 +338,28 @@ bool NumberText::PutAmount(double amount)
     return true;
 }
 
-// In front of what is there already.
+// In front of what is there already, as the next two are.
 void NumberText::PutDigits(std::uint64_t value)
 {
-    do {
-        Put(static_cast<char>('0' + value % 10));
-        value /= 10;
-    } while (value > 0);
+    for (; value >= 100; value /= 100)
+        PutPair(value % 100);
+    if (value >= 10)
+        PutPair(value);
+    else
+        Put(static_cast<char>('0' + value));
+}
+
+// Two digits at a time: half the divisions.
+void NumberText::PutPair(std::uint64_t value)
+{
+    static constexpr auto kPairs = [] {
+        std::array<std::array<char16_t, 2>, 100> pairs{};
+        for (std::size_t i = 0; i < pairs.size(); ++i)
+            pairs[i] = {static_cast<char16_t>(u'0' + i / 10), static_cast<char16_t>(u'0' + i % 10)};
+        return pairs;
+    }();
+    start -= 2;
+    std::ranges::copy(kPairs[value], room.begin() + static_cast<std::ptrdiff_t>(start));
 }
 
 Text FormatAmount(double amount)

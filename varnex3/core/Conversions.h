@@ -66,6 +66,7 @@ public:
 
 private:
     void PutDigits(std::uint64_t value);
+    void PutPair(std::uint64_t value);
     void Put(char character) { room[--start] = static_cast<char16_t>(character); }
 
     static constexpr std::size_t kRoom = 24;

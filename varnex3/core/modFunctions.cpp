@@ -58,19 +58,27 @@ Text EscapeXML(TextView text)
     return result;
 }
 
-bool SplitDateTime(TextView text, Text& datePart, Text& timePart, Text& zonePart)
+DateTimeParts::DateTimeParts(TextView text) : date(text.substr(0, kDateLength))
 {
-    constexpr std::size_t kDateLength = 10;
     const std::size_t t = text.find_first_of(u"Tt");
     const std::size_t plus = text.find(u'+');
-    datePart = text.substr(0, kDateLength);
     if (t != TextView::npos && plus != TextView::npos && plus < t)
         Raise(ErrorNumber::InvalidArgument, "modFunctions.SplitDateTime",
               Quoted(text) + u" has its time zone before its time");
     if (t != TextView::npos)
-        timePart = text.substr(t + 1, plus == TextView::npos ? plus : plus - t - 1);
+        time = text.substr(t + 1, plus == TextView::npos ? plus : plus - t - 1);
     if (plus != TextView::npos)
-        zonePart = text.substr(plus + 1);
+        zone = text.substr(plus + 1);
+}
+
+bool SplitDateTime(TextView text, Text& datePart, Text& timePart, Text& zonePart)
+{
+    datePart = text.substr(0, DateTimeParts::kDateLength); // set even where the rest raises
+    const DateTimeParts parts(text);
+    if (parts.time)
+        timePart = *parts.time;
+    if (parts.zone)
+        zonePart = *parts.zone;
     return false;
 }
 

@@ -2,6 +2,7 @@
 #pragma once
 
 #include <array>
+#include <optional>
 
 #include "varnex3/core/Rows.h"
 
@@ -24,6 +25,17 @@ VARNEX_FUNCTION(
     "InvalidArgument (5). The result is always False.");
 
 VARNEX_MODULE_END(modFunctions);
+
+// What SplitDateTime finds, in the text itself; a part that is not there is not set.
+struct DateTimeParts
+{
+    static constexpr std::size_t kDateLength = 10;
+
+    explicit DateTimeParts(TextView text);
+    TextView date;
+    std::optional<TextView> time;
+    std::optional<TextView> zone;
+};
 
 // A date as FormatDate gives it, in room of its own: nothing is allocated.
 class DateText
