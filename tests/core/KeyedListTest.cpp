@@ -96,3 +96,23 @@ TEST_CASE("KeyedList: an item stays where it is while others come and go")
     list.RemoveAt(0);
     CHECK(list.Find(u"b") == b);
 }
+
+TEST_CASE("KeyedList: however many keys there are, each is found, and none twice")
+{
+    const auto keyOf = [](int i) { return Text(static_cast<std::size_t>(i) + 1, u'k'); };
+    for (int count = 0; count < 20; ++count) {
+        KeyedList<int> list;
+        for (int i = 0; i < count; ++i)
+            list.Add(keyOf(i), i, "List.Add");
+        for (int removed = 0; removed <= count; ++removed) {
+            for (int i = 0; i < count; ++i)
+                CHECK((list.Find(keyOf(i)) ? *list.Find(keyOf(i)) : -1) == (i < removed ? -1 : i));
+            if (removed < count)
+                CHECK(RaisedBy([&] { list.Add(keyOf(count - 1), 0, "List.Add"); }) == "457 List.Add");
+            if (removed < count)
+                list.Remove(keyOf(removed), "List.Remove");
+        }
+        list.Add(keyOf(0), 7, "List.Add");
+        CHECK(*list.Find(keyOf(0)) == 7);
+    }
+}

@@ -13,9 +13,11 @@ bool IsInRange(std::int32_t position, std::size_t count)
 
 } // namespace
 
-void InsurerDetailDef::Add(const Text& sFieldName, const Text& sValue)
+void InsurerDetailDef::Add(const Text& sFieldName, const Text& sValue) { Take(sFieldName, sValue); }
+
+void InsurerDetailDef::Take(Text fieldName, Text value)
 {
-    fields.Add(sFieldName, sValue, "InsurerDetailDef.Add");
+    fields.Add(std::move(fieldName), std::move(value), "InsurerDetailDef.Add");
 }
 
 Text InsurerDetailDef::Values(const Variant& Index)

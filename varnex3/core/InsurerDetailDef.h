@@ -29,6 +29,9 @@ public:
     // The fields in order, for the records that write them.
     const KeyedList<Text>& All() const { return fields; }
 
+    // Add for texts that nobody else needs, and so are not copied.
+    void Take(Text fieldName, Text value);
+
 private:
     KeyedList<Text> fields;
     VARNEX_RECORD_END;

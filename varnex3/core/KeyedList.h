@@ -21,20 +21,24 @@ public:
 
     // Adds an item at the end. Raises DuplicateKey on behalf of the operation when the key is there already; the list
     // is then unchanged.
-    T& Add(const Text& key, T item, Name operation)
+    T& Add(Text key, T item, Name operation)
     {
-        auto entry = std::make_unique<Entry>(Entry{key, std::move(item)});
-        if (!index.emplace(entry->key, entry.get()).second)
+        if (FindEntry(key))
             Raise(ErrorNumber::DuplicateKey, operation, u"the key " + Quoted(key) + u" is already in the list");
-        entries.push_back(std::move(entry));
+        entries.push_back(std::make_unique<Entry>(Entry{std::move(key), std::move(item)}));
+        if (entries.size() == kFew + 1)
+            for (const auto& entry : entries)
+                index.emplace(entry->key, entry.get());
+        else if (entries.size() > kFew)
+            index.emplace(entries.back()->key, entries.back().get());
         return entries.back()->item;
     }
 
     // The item of a key, or null.
     T* Find(TextView key)
     {
-        const auto found = index.find(key);
-        return found == index.end() ? nullptr : &found->second->item;
+        Entry* const found = FindEntry(key);
+        return found ? &found->item : nullptr;
     }
 
     // Precondition of these: position < Count().
@@ -45,17 +49,18 @@ public:
     {
         index.erase(entries[position]->key);
         entries.erase(entries.begin() + static_cast<std::ptrdiff_t>(position));
+        if (entries.size() == kFew)
+            index.clear();
     }
 
     // Raises KeyNotFound on behalf of the operation when there is no such key.
     void Remove(TextView key, Name operation)
     {
-        const auto found = index.find(key);
-        if (found == index.end())
+        const Entry* const found = FindEntry(key);
+        if (!found)
             Raise(ErrorNumber::KeyNotFound, operation, u"the key " + Quoted(key) + u" is not in the list");
-        const auto entry = std::ranges::find(entries, found->second, &std::unique_ptr<Entry>::get);
-        index.erase(found);
-        entries.erase(entry);
+        const auto entry = std::ranges::find(entries, found, &std::unique_ptr<Entry>::get);
+        RemoveAt(static_cast<std::size_t>(entry - entries.begin()));
     }
 
 private:
@@ -65,8 +70,21 @@ private:
         T item;
     };
 
+    Entry* FindEntry(TextView key) const
+    {
+        if (entries.size() > kFew) {
+            const auto found = index.find(key);
+            return found == index.end() ? nullptr : found->second;
+        }
+        const auto found = std::ranges::find(entries, key, [](const auto& entry) { return TextView(entry->key); });
+        return found == entries.end() ? nullptr : found->get();
+    }
+
+    static constexpr std::size_t kFew = 8; // that many keys are looked through faster than an index is made
+
     std::vector<std::unique_ptr<Entry>> entries;
-    std::unordered_map<TextView, Entry*> index; // the views look into the entries, which stay where they are
+    // Of more than a few entries; empty for fewer. The views look into the entries, which stay where they are.
+    std::unordered_map<TextView, Entry*> index;
 };
 
 } // namespace varnex3

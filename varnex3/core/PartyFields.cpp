@@ -20,7 +20,7 @@ void WriteSetFields(XmlWriter& xml, Name element, const InsurerDetailDef& fields
 void ReadFields(const XmlSection& section, Name element, InsurerDetailDef& fields)
 {
     for (const xml::Node& field : section.ElementsNamed(element))
-        fields.Add(section.FirstAttributeOf(field), field.Text());
+        fields.Take(section.FirstAttributeOf(field), field.Text());
 }
 
 } // namespace varnex3
