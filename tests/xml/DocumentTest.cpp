@@ -86,8 +86,7 @@ TEST_CASE("An absent node has no name, text, markup, children or attributes")
     CHECK_FALSE(absent.IsElement("a"));
     CHECK_FALSE(absent.FirstChild());
     CHECK_FALSE(absent.NextSibling());
-    CHECK_FALSE(absent.FirstChildElement("a"));
-    CHECK_FALSE(absent.NextSiblingElement("a"));
+    CHECK_FALSE(ChildElements(absent).First("a"));
     CHECK(absent.AttributeCount() == 0);
     CHECK_FALSE(absent.SelectSingle("a"));
     CHECK(absent.Select("a").empty());
@@ -252,15 +251,61 @@ TEST_CASE("IsElement wants the whole name, of an element")
     CHECK_FALSE(document.Root().IsElement("#document"));
 }
 
-TEST_CASE("Children and siblings of a name are found past other nodes")
+TEST_CASE("The first child of a name is found past other nodes, whatever comes behind it")
 {
-    const Document document = Loaded(u"<r>t<a>1</a><!--c--><b/><a>2</a></r>");
-    const Node first = document.DocumentElement().FirstChildElement("a");
-    CHECK(first.Text() == u"1");
-    CHECK(first.NextSiblingElement("a").Text() == u"2");
-    CHECK_FALSE(first.NextSiblingElement("a").NextSiblingElement("a"));
-    CHECK_FALSE(document.DocumentElement().FirstChildElement("c"));
-    CHECK(document.Root().FirstChildElement("r"));
+    const Document document = Loaded(u"<r>t<a>1</a><!--c--><?c d?><b/><a>2</a></r>");
+    const ChildElements children(document.DocumentElement());
+    CHECK(children.First("a").Text() == u"1");
+    CHECK(children.First("b"));
+    CHECK_FALSE(children.First("c"));
+    CHECK_FALSE(children.First("t"));
+    CHECK(ChildElements(document.Root()).First("r"));
+}
+
+TEST_CASE("Children are those of the node alone, not what stands inside or behind them")
+{
+    const Document document = Loaded(u"<r><x><a>deep</a></x><y>text</y><z/><a>1</a></r>");
+    CHECK(ChildElements(document.DocumentElement()).First("a").Text() == u"1");
+    for (const char* path : {"r/y", "r/z"})
+        CHECK_FALSE(ChildElements(document.SelectSingle(path)).First("a"));
+    CHECK_FALSE(ChildElements(document.SelectSingle("r/y").FirstChild()).First("a"));
+}
+
+TEST_CASE("A child is found although another name before it has the same bit")
+{
+    REQUIRE(NameBit(std::string_view("a_c")) == NameBit(std::string_view("abc")));
+    const Document document = Loaded(u"<r><a_c>1</a_c><abc>2</abc><a_c>3</a_c></r>");
+    const ChildElements children(document.DocumentElement());
+    CHECK(children.First("a_c").Text() == u"1");
+    CHECK(children.First("abc").Text() == u"2");
+    CHECK_FALSE(children.First("a.c"));
+}
+
+TEST_CASE("Names are compared to the letter, whatever their length and their characters")
+{
+    const Document document =
+        Loaded(u"<r><abc/><abcd/><abcdefg/><abcdefgh/><abcdefghijklmnopq/><ÃabcdefgÃ/><Ārchive/></r>");
+    const Node r = document.DocumentElement();
+    for (const char* name : {"abc", "abcd", "abcdefg", "abcdefgh", "abcdefghijklmnopq", "ÃabcdefgÃ", "Ārchive"})
+        CHECK(r.SelectSingle(name));
+    for (const char* name : {"ab", "Abc", "abC", "Abcd", "abcD", "abXdefg", "abcdefG", "Abcdefgh", "abcdefgX",
+                             "abcdefghijklmnopX", "abcdefghXjklmnopq", "abcdefghijklmnop",
+                             "\xC3"
+                             "abcdefg\xC3",
+                             "?rchive"})
+        CHECK_FALSE(r.SelectSingle(name));
+}
+
+TEST_CASE("A text may be seen where it stands; one with references, or of several pieces, in the room given")
+{
+    const Document document = Loaded(u"<r><a>plain</a><b>&lt;</b><c>x<!--y-->z</c><d/></r>");
+    std::u16string room = u"before";
+    CHECK(document.SelectSingle("r/a").Text(room) == u"plain");
+    CHECK(room == u"before");
+    CHECK(document.SelectSingle("r/b").Text(room) == u"<");
+    CHECK(document.SelectSingle("r/c").Text(room) == u"xz");
+    CHECK(document.SelectSingle("r/d").Text(room) == u"");
+    CHECK(Node().Text(room) == u"");
 }
 
 TEST_CASE("A path leads from the document through the root element")

@@ -2,6 +2,7 @@
 #pragma once
 
 #include <cstdint>
+#include <cstring>
 
 #include "varnex3/core/Text.h"
 #include "varnex3/xml/NameSet.h"
@@ -40,10 +41,38 @@ public:
     // The bit of the first step behind the group.
     std::uint8_t Bit() const { return bit; }
 
+    // Whether the group is that one, which is a first step as well.
+    bool HasGroup(Name other) const { return groupLength == other.size() && AreSame(text, other.data(), groupLength); }
+
     Name Whole() const { return IsGroup() ? Group() : Name(text, innerStart + std::size_t{innerLength}); }
     Name LastStep() const { return Whole().substr(Whole().rfind('/') + 1); }
 
 private:
+    // Names are compared for every value that is read: two steps for most, where a call would take longer.
+    static bool AreSame(const char* a, const char* b, std::size_t length)
+    {
+        if (length < 4 || length > 16)
+            return std::memcmp(a, b, length) == 0;
+        if (length < 8)
+            return AreSameEnds<std::uint32_t>(a, b, length);
+        return AreSameEnds<std::uint64_t>(a, b, length);
+    }
+
+    template <class Word>
+    static bool AreSameEnds(const char* a, const char* b, std::size_t length)
+    {
+        const std::size_t last = length - sizeof(Word);
+        return ((WordAt<Word>(a) ^ WordAt<Word>(b)) | (WordAt<Word>(a + last) ^ WordAt<Word>(b + last))) == 0;
+    }
+
+    template <class Word>
+    static Word WordAt(const char* p)
+    {
+        Word word = 0;
+        std::memcpy(&word, p, sizeof(word));
+        return word;
+    }
+
     static consteval std::uint8_t Short(std::size_t length)
     {
         return length <= 255 ? static_cast<std::uint8_t>(length) : throw "a path of more than 255 characters";

@@ -1,5 +1,7 @@
 #include "varnex3/core/XmlSection.h"
 
+#include <algorithm>
+#include <array>
 #include <string>
 
 #include "varnex3/core/Conversions.h"
@@ -15,56 +17,43 @@ std::string ParseXMLOf(Name reader) { return std::string(reader) + ".ParseXML"; 
 // Date and time of an ISO text, without fraction and zone.
 Date TimestampFrom(TextView text)
 {
-    Text datePart;
-    Text timePart;
-    Text zonePart;
-    SplitDateTime(text, datePart, timePart, zonePart);
-    const Text time = timePart.substr(0, 8);
-    return DateFrom(time.empty() ? datePart : datePart + u" " + time);
+    constexpr std::size_t kTimeLength = 8;
+    const DateTimeParts parts(text);
+    const TextView time = parts.time.value_or(TextView()).substr(0, kTimeLength);
+    if (time.empty())
+        return DateFrom(parts.date);
+    std::array<char16_t, DateTimeParts::kDateLength + 1 + kTimeLength> joined; // NOLINT: filled below
+    char16_t* end = std::ranges::copy(parts.date, joined.data()).out;
+    *end++ = u' ';
+    end = std::ranges::copy(time, end).out;
+    return DateFrom(TextView(joined.data(), end));
 }
 
 } // namespace
 
-bool XmlSection::IsNamed(Name group) const
+bool XmlSection::BeginsHere(ElementPath path) const
 {
-    if (lastGroup != group) {
-        lastGroup = group;
-        isLastGroup = element.IsElement(group);
+    if (!path.HasGroup(lastGroup)) {
+        lastGroup = path.Group();
+        isLastGroup = element.IsElement(lastGroup);
     }
     return isLastGroup;
 }
 
-const xml::ChildNames& XmlSection::Names() const
+const xml::ChildElements& XmlSection::Children() const
 {
-    if (!hasNames) {
-        hasNames = true;
-        names = element.NamesOfChildren();
-    }
-    return names;
-}
-
-// The first child of a name. One that may be there but once is looked for behind the last one found first.
-xml::Node XmlSection::FindChild(ElementPath path) const
-{
-    xml::Node found;
-    if (!xml::Has(Names().repeated, path.Bit()))
-        found = lastFound.NextSiblingElement(path.Inner());
-    if (!found)
-        found = element.FirstChildElement(path.Inner());
-    if (found)
-        lastFound = found;
-    return found;
+    if (!children)
+        children.emplace(element);
+    return *children;
 }
 
 xml::Node XmlSection::Find(ElementPath path) const
 {
-    if (!element || !IsNamed(path.Group()))
-        return {};
     if (path.IsGroup())
-        return element;
-    if (!xml::Has(Names().all, path.Bit()))
+        return BeginsHere(path) ? element : xml::Node();
+    if (!Children().MayHave(path.Bit()) || !BeginsHere(path))
         return {};
-    return path.IsDeep() ? element.SelectSingle(path.Inner()) : FindChild(path);
+    return path.IsDeep() ? element.SelectSingle(path.Inner()) : Children().First(path.Inner(), path.Bit());
 }
 
 xml::Node XmlSection::Require(ElementPath path) const
@@ -84,38 +73,42 @@ auto XmlSection::Converted(ElementPath path, TextView text, Convert convert) con
     }
 }
 
+// Of an element that is there.
+template <class Convert>
+auto XmlSection::ConvertedOrZero(ElementPath path, Convert convert) const
+{
+    using Result = decltype(convert(TextView()));
+    const xml::Node node = Find(path);
+    Text room;
+    return node ? Converted(path, node.Text(room), convert) : Result{};
+}
+
 Text XmlSection::TextAt(ElementPath path) const { return Find(path).Text(); }
 
 Text XmlSection::RequiredTextAt(ElementPath path) const { return Require(path).Text(); }
 
-double XmlSection::NumberAt(ElementPath path) const
-{
-    const xml::Node node = Find(path);
-    return node ? Converted(path, node.Text(), NumberFrom) : 0;
-}
+double XmlSection::NumberAt(ElementPath path) const { return ConvertedOrZero(path, NumberFrom); }
 
-std::int16_t XmlSection::Int16At(ElementPath path) const
-{
-    const xml::Node node = Find(path);
-    return node ? Converted(path, node.Text(), Int16From) : std::int16_t{0};
-}
+std::int16_t XmlSection::Int16At(ElementPath path) const { return ConvertedOrZero(path, Int16From); }
 
-std::int32_t XmlSection::Int32At(ElementPath path) const
-{
-    const xml::Node node = Find(path);
-    return node ? Converted(path, node.Text(), Int32From) : 0;
-}
+std::int32_t XmlSection::Int32At(ElementPath path) const { return ConvertedOrZero(path, Int32From); }
 
 Date XmlSection::RequiredTimestampAt(ElementPath path) const
 {
-    return Converted(path, RequiredTextAt(path), TimestampFrom);
+    Text room;
+    return Converted(path, Require(path).Text(room), TimestampFrom);
 }
 
-Date XmlSection::TimestampAt(ElementPath path) const { return Converted(path, TextAt(path), TimestampFrom); }
+Date XmlSection::TimestampAt(ElementPath path) const
+{
+    Text room;
+    return Converted(path, Find(path).Text(room), TimestampFrom);
+}
 
 Date XmlSection::TimestampAt(ElementPath path, Date otherwise) const
 {
-    const Text text = TextAt(path);
+    Text room;
+    const TextView text = Find(path).Text(room);
     return IsSet(text) ? Converted(path, text, TimestampFrom) : otherwise;
 }
 
@@ -123,7 +116,7 @@ bool XmlSection::Has(ElementPath path) const { return static_cast<bool>(Find(pat
 
 xml::NodeList XmlSection::NodesAt(ElementPath path) const
 {
-    return element && IsNamed(path.Group()) ? element.Select(path.Inner()) : xml::NodeList();
+    return BeginsHere(path) ? element.Select(path.Inner()) : xml::NodeList();
 }
 
 xml::Node XmlSection::FirstChildOf(ElementPath path) const { return Find(path).FirstChild(); }
@@ -140,7 +133,7 @@ Text XmlSection::FirstAttributeOf(const xml::Node& node) const
 {
     if (node.AttributeCount() == 0)
         Raise(ErrorNumber::ObjectNotSet, ParseXMLOf(reader), u"the element " + node.Name() + u" has no attribute");
-    return node.AttributeAt(0).value;
+    return node.AttributeValue(0);
 }
 
 } // namespace varnex3

@@ -6,6 +6,7 @@
 #pragma once
 
 #include <cstdint>
+#include <optional>
 
 #include "varnex3/core/Date.h"
 #include "varnex3/core/ElementPath.h"
@@ -81,21 +82,19 @@ private:
     xml::Node Require(ElementPath path) const;
     template <class Convert>
     auto Converted(ElementPath path, TextView text, Convert convert) const;
+    template <class Convert>
+    auto ConvertedOrZero(ElementPath path, Convert convert) const;
 
-    bool IsNamed(Name group) const;
-    const xml::ChildNames& Names() const;
-    xml::Node FindChild(ElementPath path) const;
+    bool BeginsHere(ElementPath path) const;
+    const xml::ChildElements& Children() const;
 
     xml::Node element;
     Name reader;
 
-    // What was found out about the element: nearly every path begins alike, half of them lead to what is not there, and
-    // the others mostly to the element behind the one before.
+    // What was found out about the element: nearly every path begins alike, and half of them lead to what is not there.
     mutable Name lastGroup;
     mutable bool isLastGroup = false;
-    mutable bool hasNames = false;
-    mutable xml::ChildNames names;
-    mutable xml::Node lastFound;
+    mutable std::optional<xml::ChildElements> children;
 };
 
 template <class T>

@@ -141,7 +141,7 @@ void QuoteItemPartPartSource::Read(const XmlSection& section)
             sPartSourceCode = row.readCode;
         }
     if (child.AttributeCount() > 0)
-        sPartNumber = child.AttributeAt(0).value;
+        sPartNumber = child.AttributeValue(0);
 }
 
 } // namespace varnex3

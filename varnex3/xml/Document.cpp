@@ -17,6 +17,7 @@
 namespace varnex3::xml {
 namespace {
 
+constexpr std::size_t usualCount = 16; // of the elements that a path leads to
 constexpr std::uint64_t longestText = std::numeric_limits<std::uint32_t>::max();
 
 ParseError TooLarge() { return {ErrorCode::TooLarge, 1, 1, u"The text is longer than 4,294,967,295 characters"}; }
@@ -35,6 +36,16 @@ std::size_t DecisiveLength(std::basic_string_view<Char> text)
     constexpr std::size_t longestCharacter = 4;
     const bool mayBeWellFormed = text.empty() || text[0] == '<' || IsBlank(text[0]);
     return mayBeWellFormed ? text.size() : std::min(text.size(), longestCharacter);
+}
+
+// The attribute of an element at a position, namespace declarations not counted. Precondition: there is one.
+template <class Char>
+const TreeAttribute& NamedAttribute(const Tree<Char>& tree, NodeIndex element, std::size_t position)
+{
+    const TreeAttribute* at = tree.FirstAttribute(element);
+    for (;; at = tree.NextAttribute(at))
+        if (!IsNamespaceDeclaration(tree.AttributeName(*at)) && position-- == 0)
+            return *at;
 }
 
 // A whole file, read into the buffer it is parsed in. One that grows meanwhile is followed to its end.
@@ -254,10 +265,23 @@ bool Node::IsElement(std::string_view name) const
 
 std::u16string Node::Text() const
 {
-    std::u16string text;
-    if (document)
-        document->content->Visit([&](const auto& tree) { tree.AppendText(text, index); });
-    return text;
+    std::u16string room;
+    const std::u16string_view text = Text(room);
+    return room.empty() ? std::u16string(text) : std::move(room);
+}
+
+std::u16string_view Node::Text(std::u16string& room) const
+{
+    if (!document)
+        return {};
+    return document->content->Visit([&]<class Char>(const Tree<Char>& tree) -> std::u16string_view {
+        if constexpr (sizeof(Char) == sizeof(char16_t))
+            if (tree.IsPlainLeaf(index))
+                return tree.Content(index);
+        room.clear();
+        tree.AppendText(room, index);
+        return room;
+    });
 }
 
 std::u16string Node::Xml() const
@@ -291,31 +315,6 @@ Node Node::NextSibling() const
     return next != noNode ? Node(document, next) : Node();
 }
 
-Node Node::NextSiblingElement(std::string_view name) const
-{
-    if (!document)
-        return {};
-    const NodeIndex next =
-        document->content->Visit([&](const auto& tree) { return FindFrom(tree, tree.NextSibling(index), name); });
-    return next != noNode ? Node(document, next) : Node();
-}
-
-Node Node::FirstChildElement(std::string_view name) const
-{
-    if (!document)
-        return {};
-    const NodeIndex child =
-        document->content->Visit([&](const auto& tree) { return FindFrom(tree, tree.FirstChild(index), name); });
-    return child != noNode ? Node(document, child) : Node();
-}
-
-ChildNames Node::NamesOfChildren() const
-{
-    if (!document)
-        return {};
-    return document->content->Visit([this](const auto& tree) { return xml::NamesOfChildren(tree, index); });
-}
-
 std::size_t Node::AttributeCount() const
 {
     if (!document)
@@ -331,14 +330,20 @@ std::size_t Node::AttributeCount() const
 Attribute Node::AttributeAt(std::size_t position) const
 {
     return document->content->Visit([&](const auto& tree) {
-        auto at = tree.FirstAttribute(index);
-        for (std::size_t left = position;; at = tree.NextAttribute(at))
-            if (!IsNamespaceDeclaration(tree.AttributeName(*at)) && left-- == 0)
-                break;
+        const TreeAttribute& at = NamedAttribute(tree, index, position);
         Attribute attribute;
-        AppendPlain(attribute.name, tree.AttributeName(*at));
-        tree.AppendValue(attribute.value, *at);
+        AppendPlain(attribute.name, tree.AttributeName(at));
+        tree.AppendValue(attribute.value, at);
         return attribute;
+    });
+}
+
+std::u16string Node::AttributeValue(std::size_t position) const
+{
+    return document->content->Visit([&](const auto& tree) {
+        std::u16string value;
+        tree.AppendValue(value, NamedAttribute(tree, index, position));
+        return value;
     });
 }
 
@@ -356,8 +361,11 @@ NodeList Node::Select(std::string_view path) const
     NodeList found;
     if (document)
         document->content->Visit([&](const auto& tree) {
-            for (PathSearch search(tree, index, path); search.Found() != noNode; search.Next())
+            for (PathSearch search(tree, index, path); search.Found() != noNode; search.Next()) {
+                if (found.empty())
+                    found.reserve(usualCount);
                 found.push_back(Node(document, search.Found()));
+            }
         });
     return found;
 }
@@ -372,6 +380,33 @@ NodeList Node::ElementsByTagName(std::string_view name) const
                     found.push_back(Node(document, at));
         });
     return found;
+}
+
+// ---- ChildElements
+
+ChildElements::ChildElements(const Node& parent) : document(parent.document) // NOLINT: firsts are set with their bits
+{
+    if (!document)
+        return;
+    document->content->Visit([&](const auto& tree) {
+        const NodeIndex end = tree.End(parent.index);
+        for (NodeIndex child = parent.index + 1; child < end; child = tree.End(child)) {
+            const std::uint8_t bit = NameBit(tree.Name(child));
+            if (!tree.IsElement(child) || Has(bits, bit))
+                continue;
+            bits |= NameSet{1} << bit;
+            firsts[bit] = child;
+        }
+    });
+}
+
+Node ChildElements::First(std::string_view name, std::uint8_t bit) const
+{
+    if (!MayHave(bit))
+        return {};
+    const NodeIndex found =
+        document->content->Visit([&](const auto& tree) { return FindFrom(tree, firsts[bit], name); });
+    return found != noNode ? Node(document, found) : Node();
 }
 
 } // namespace varnex3::xml

@@ -12,6 +12,7 @@
 // A document is not synchronised: one thread at a time.
 #pragma once
 
+#include <array>
 #include <cstddef>
 #include <cstdint>
 #include <memory>
@@ -69,6 +70,9 @@ public:
     // instructions skipped, CDATA included, nothing trimmed. The content of a text, comment or instruction node.
     std::u16string Text() const;
 
+    // The same without a copy, where the document has the text as it is; in the given room where it has not.
+    std::u16string_view Text(std::u16string& room) const;
+
     // The node as markup that loads again to the same node, its texts and values with the references and quotes they
     // were written with. Elements that hold only elements are laid out one to a line, indented with TABs, ended with
     // CR LF (100 levels down; deeper ones stay on their line); the markup itself has no line end before or after it.
@@ -79,18 +83,12 @@ public:
     Node FirstChild() const;
     Node NextSibling() const;
 
-    // The next element of this name from here on among the following siblings; absent when there is none.
-    Node NextSiblingElement(std::string_view name) const;
-    Node FirstChildElement(std::string_view name) const;
-
-    // Which names the elements directly inside may have.
-    ChildNames NamesOfChildren() const;
-
     // The number of attributes, namespace declarations not counted.
     std::size_t AttributeCount() const;
 
     // The attribute at this position, from 0, in the order written. Precondition: index < AttributeCount().
     Attribute AttributeAt(std::size_t index) const;
+    std::u16string AttributeValue(std::size_t index) const;
 
     // The first element that a child path such as "Version/XaloVersion" leads to: one name a step, from this node
     // (from the document: the first step names the root element). Blanks around a step are ignored. Absent when there
@@ -105,11 +103,33 @@ public:
     NodeList ElementsByTagName(std::string_view name) const;
 
 private:
+    friend class ChildElements;
     friend class Document;
     Node(const Document* owner, std::uint32_t at) : document(owner), index(at) {}
 
     const Document* document = nullptr;
     std::uint32_t index = 0;
+};
+
+// The elements directly inside a node, by name. They are looked through once; finding one then hardly looks at others.
+// Valid as long as the node is.
+class ChildElements
+{
+public:
+    explicit ChildElements(const Node& parent);
+
+    // Whether there may be one whose name has this bit (see NameBit); if not, there is none.
+    bool MayHave(std::uint8_t bit) const { return Has(bits, bit); }
+
+    // The first one of this name, which is ASCII; absent when there is none. The bit is the name's.
+    Node First(std::string_view name, std::uint8_t bit) const;
+    Node First(std::string_view name) const { return First(name, NameBit(name)); }
+
+private:
+    const Document* document;
+    NameSet bits = 0;
+    std::array<std::uint32_t, bitsOfNames>
+        firsts; // NOLINT(cppcoreguidelines-pro-type-member-init): where the bit is set
 };
 
 class Document
@@ -156,6 +176,7 @@ public:
     void SaveFile(std::u16string_view path) const;
 
 private:
+    friend class ChildElements;
     friend class Node;
     struct Content;
     std::unique_ptr<Content> content;

@@ -9,12 +9,7 @@ namespace varnex3::xml {
 
 using NameSet = std::uint64_t;
 
-// The names of the elements inside a node.
-struct ChildNames
-{
-    NameSet all = 0;
-    NameSet repeated = 0; // the bits of more than one element: of a name without, there is one at most
-};
+inline constexpr std::size_t bitsOfNames = 64;
 
 constexpr bool Has(NameSet names, std::uint8_t bit) { return (names >> bit & 1) != 0; }
 
@@ -27,7 +22,7 @@ constexpr std::uint8_t NameBit(std::basic_string_view<Char> name)
         return 0;
     const auto first = static_cast<std::size_t>(name.front());
     const auto last = static_cast<std::size_t>(name.back());
-    return static_cast<std::uint8_t>((name.size() * 9 + first * 25 + last * 30) % 64);
+    return static_cast<std::uint8_t>((name.size() * 9 + first * 25 + last * 30) % bitsOfNames);
 }
 
 } // namespace varnex3::xml

@@ -5,6 +5,7 @@
 #include <string>
 #include <string_view>
 
+#include "varnex3/xml/Scan.h"
 #include "varnex3/xml/Tree.h"
 #include "varnex3/xml/Unicode.h"
 
@@ -12,17 +13,18 @@ namespace varnex3::xml {
 
 inline bool SameName(std::string_view name, std::string_view utf8) { return name == utf8; }
 
+// Apart, so that the comparison of most names stays short.
+[[gnu::noinline]] inline bool SameDecoded(std::u16string_view name, std::string_view utf8)
+{
+    const bool isAscii = std::none_of(utf8.begin(), utf8.end(), [](char c) { return Unit(c) >= 0x80; });
+    return !isAscii && name == ToUtf16(utf8);
+}
+
 inline bool SameName(std::u16string_view name, std::string_view utf8)
 {
     if (name.size() > utf8.size()) // a unit takes a byte at least
         return false;
-    for (std::size_t i = 0; i < std::min(name.size(), utf8.size()); ++i) {
-        if (Unit(utf8[i]) >= 0x80)
-            return name.substr(i) == ToUtf16(utf8.substr(i));
-        if (name[i] != Unit(utf8[i]))
-            return false;
-    }
-    return name.size() == utf8.size();
+    return (name.size() == utf8.size() && SameAscii(name.data(), utf8.data(), utf8.size())) || SameDecoded(name, utf8);
 }
 
 // A path such as "Version/XaloVersion", seen a step at a time. Blanks around a step are ignored.
@@ -72,18 +74,6 @@ template <class Char>
 bool IsNamed(const Tree<Char>& tree, NodeIndex at, std::string_view name)
 {
     return tree.IsElement(at) && SameName(tree.Name(at), name);
-}
-
-template <class Char>
-ChildNames NamesOfChildren(const Tree<Char>& tree, NodeIndex at)
-{
-    ChildNames names;
-    for (NodeIndex child = tree.FirstChild(at); child != noNode; child = tree.NextSibling(child)) {
-        const NameSet bit = tree.IsElement(child) ? NameSet{1} << NameBit(tree.Name(child)) : 0;
-        names.repeated |= names.all & bit;
-        names.all |= bit;
-    }
-    return names;
 }
 
 // The first element of a name among a node and its following siblings.

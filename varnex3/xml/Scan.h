@@ -10,6 +10,7 @@
 #include <bit>
 #include <cstddef>
 #include <cstdint>
+#include <cstring>
 
 #include "varnex3/xml/Characters.h"
 
@@ -71,6 +72,27 @@ inline bool CopyAsciiBlock(const char16_t* from, char* to)
         return false;
     _mm_storeu_si128(reinterpret_cast<__m128i*>(to), _mm_packus_epi16(first, second));
     return true;
+}
+
+// Whether characters are ASCII and the same in both widths: eight of them, and four.
+inline bool AreSameAscii(__m128i wide, __m128i narrow)
+{
+    const __m128i isSame = _mm_cmpeq_epi16(wide, _mm_unpacklo_epi8(narrow, _mm_setzero_si128()));
+    return _mm_movemask_epi8(isSame) == 0xFFFF && _mm_movemask_epi8(narrow) == 0;
+}
+
+inline __m128i LoadHalf(const void* p) { return _mm_loadl_epi64(static_cast<const __m128i*>(p)); }
+
+inline bool SameEight(const char16_t* wide, const char* ascii)
+{
+    return AreSameAscii(LoadBlock(wide), LoadHalf(ascii));
+}
+
+inline bool SameFour(const char16_t* wide, const char* ascii)
+{
+    int four = 0;
+    std::memcpy(&four, ascii, sizeof(four));
+    return AreSameAscii(LoadHalf(wide), _mm_cvtsi32_si128(four));
 }
 
 // One bit for each of the sixteen characters that is in the class.
@@ -190,6 +212,25 @@ template <class Char>
         --count;
     return count == 0;
 #endif
+}
+
+// Whether characters are those of an ASCII text, as many of them; false, too, where that text is not ASCII. Most names
+// have four characters and more: the blocks at their end overlap those before.
+inline bool SameAscii(const char16_t* wide, const char* ascii, std::size_t count)
+{
+    std::size_t i = 0;
+#ifdef VARNEX3_XML_SSE2
+    for (; i + 8 < count; i += 8)
+        if (!detail::SameEight(wide + i, ascii + i))
+            return false;
+    if (count >= 8)
+        return detail::SameEight(wide + count - 8, ascii + count - 8);
+    if (count >= 4)
+        return detail::SameFour(wide, ascii) && detail::SameFour(wide + count - 4, ascii + count - 4);
+#endif
+    while (i < count && wide[i] == Unit(ascii[i]) && Unit(ascii[i]) < 0x80)
+        ++i;
+    return i == count;
 }
 
 } // namespace varnex3::xml

@@ -118,6 +118,12 @@ public:
         return {text.Data() + node.text, node.extent};
     }
 
+    // Whether a node is an element with a text alone, which stands in the document as it is meant.
+    bool IsPlainLeaf(NodeIndex at) const
+    {
+        return !IsInnerText(at) && (nodes[at].flags & (HasTextInside | NeedsDecoding)) == HasTextInside;
+    }
+
     // Appends all text inside a node; of a comment or instruction, its content.
     void AppendText(std::u16string& to, NodeIndex at) const;
 
