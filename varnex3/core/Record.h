@@ -9,6 +9,8 @@
 #include <type_traits>
 #include <utility>
 
+#include "varnex3/core/RecordRoom.h"
+
 namespace varnex3 {
 
 struct ClassInfo;
@@ -41,14 +43,22 @@ public:
     std::int32_t AddRef() const noexcept { return references.fetch_add(1, std::memory_order_relaxed) + 1; }
     std::int32_t Release() const noexcept
     {
-        const std::int32_t left = references.fetch_sub(1, std::memory_order_acq_rel) - 1;
+        // Who holds the only reference is alone with the record: no other thread can be counting.
+        const bool isOnly = references.load(std::memory_order_acquire) == 1;
+        const std::int32_t left = isOnly ? 0 : references.fetch_sub(1, std::memory_order_acq_rel) - 1;
         if (left == 0)
             delete this;
         return left;
     }
 
+    // The first reference to a new record, which nobody else knows.
+    void AddFirstRef() const noexcept { references.store(1, std::memory_order_relaxed); }
+
     // Null until a face needs it; ends with the record.
     std::unique_ptr<Attachment>& Attached() noexcept { return attachment; }
+
+    static void* operator new(std::size_t size) { return RecordRoom::Allocate(size); }
+    static void operator delete(void* memory) noexcept { RecordRoom::Free(memory); }
 
 protected:
     Record() = default;
@@ -94,6 +104,9 @@ public:
     friend bool operator==(const Ref& a, const Ref& b) { return a.record == b.record; }
 
 private:
+    template <class U>
+    friend Ref<U> New();
+
     T* record = nullptr;
 };
 
@@ -101,7 +114,10 @@ private:
 template <class T>
 Ref<T> New()
 {
-    return Ref<T>(new T);
+    Ref<T> made;
+    made.record = new T;
+    made.record->AddFirstRef();
+    return made;
 }
 
 // Whether two functions are one. As types: a sanitizer build does not compare addresses while it compiles.

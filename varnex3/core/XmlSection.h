@@ -102,6 +102,7 @@ void XmlSection::ReadText(T& record, TextView text)
 {
     xml::Document document;
     document.LoadText(text);
+    const RecordRoom room(text.size()); // a record takes about as many bytes as its text has characters
     record.Read(XmlSection(document.DocumentElement(), T::ClassName));
 }
 

@@ -1,0 +1,97 @@
+#include "varnex3/core/RecordRoom.h"
+
+#include <algorithm>
+#include <atomic>
+#include <limits>
+#include <new>
+#include <utility>
+
+namespace varnex3 {
+
+namespace {
+
+constexpr std::size_t kAlignment = __STDCPP_DEFAULT_NEW_ALIGNMENT__;
+constexpr std::size_t kLeast = 512;
+constexpr std::size_t kMost = 16 * 1024; // what a single record that lives on may keep from being freed
+
+// A block that is being filled counts as used by as many records as it could never hold, so that filling it need not
+// count; what is too much is taken off when it is full.
+constexpr std::int32_t kOpen = std::numeric_limits<std::int32_t>::max();
+
+thread_local constinit RecordRoom* innermost = nullptr;
+
+constexpr std::size_t Aligned(std::size_t size) { return (size + kAlignment - 1) / kAlignment * kAlignment; }
+
+} // namespace
+
+// In front of the records of a block.
+struct alignas(kAlignment) RecordRoom::Block
+{
+    std::atomic<std::int32_t> users{kOpen};
+};
+
+// In front of each record; without a block it stands by itself.
+struct alignas(kAlignment) RecordRoom::Header
+{
+    Block* block;
+};
+
+RecordRoom::RecordRoom(std::size_t expected)
+    : blockSize(std::clamp(expected, kLeast, kMost)), outer(std::exchange(innermost, this))
+{}
+
+RecordRoom::~RecordRoom()
+{
+    Close();
+    innermost = outer;
+}
+
+void* RecordRoom::Allocate(std::size_t size)
+{
+    return innermost ? innermost->Take(size) : Place(::operator new(sizeof(Header) + size), nullptr);
+}
+
+void RecordRoom::Free(void* memory) noexcept
+{
+    Header* const header = static_cast<Header*>(memory) - 1;
+    header->block ? Drop(header->block, 1) : ::operator delete(header);
+}
+
+void* RecordRoom::Take(std::size_t size)
+{
+    const std::size_t needed = sizeof(Header) + Aligned(size);
+    if (needed > left)
+        Open(needed);
+    void* const memory = std::exchange(next, next + needed);
+    left -= needed;
+    ++taken;
+    return Place(memory, block);
+}
+
+void RecordRoom::Open(std::size_t needed)
+{
+    Close();
+    const std::size_t size = std::max(needed, blockSize);
+    block = new (::operator new(sizeof(Block) + size)) Block;
+    next = reinterpret_cast<std::byte*>(block + 1);
+    left = size;
+}
+
+void RecordRoom::Close() noexcept
+{
+    if (block)
+        Drop(block, kOpen - taken);
+    block = nullptr;
+    left = 0;
+    taken = 0;
+}
+
+void* RecordRoom::Place(void* memory, Block* block) { return new (memory) Header{block} + 1; }
+
+void RecordRoom::Drop(Block* block, std::int32_t users) noexcept
+{
+    if (block->users.fetch_sub(users, std::memory_order_acq_rel) == users)
+        ::operator delete(block);
+}
+
+} // namespace varnex3
