@@ -55,16 +55,27 @@ void XmlWriter::PutLine(Part... parts)
     ((to = Put(to, parts)), ...);
 }
 
-// What stands before the line that does not fit is kept. A list goes on as it began, give or take an eighth.
+// What stands before the line that does not fit is kept.
 void XmlWriter::Grow(std::size_t written)
+{
+    constexpr std::size_t kStep = 8 * 1024; // what is written stays near the processor
+    const std::size_t needed = length + kTabs.size();
+    if (needed > grown.capacity())
+        Move(written);
+    grown.resize(std::max(needed, std::min(grown.capacity(), needed + kStep)));
+    room = grown;
+}
+
+// A list goes on as it began, give or take an eighth.
+void XmlWriter::Move(std::size_t written)
 {
     std::size_t wanted = 2 * length;
     if (list.done > 0)
         wanted = length + (written - list.start) / list.done * (list.count - list.done);
-    Text larger(wanted + wanted / 8 + kTabs.size(), u'\0');
-    std::copy_n(room.data(), written, larger.data());
+    Text larger;
+    larger.reserve(wanted + wanted / 8 + kTabs.size());
+    larger.assign(room.data(), written);
     grown = std::move(larger);
-    room = grown;
 }
 
 Text XmlWriter::Taken()

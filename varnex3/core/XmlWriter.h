@@ -104,8 +104,9 @@ private:
     template <class... Part>
     void PutLine(Part... parts);
 
-    // Makes room for the length, with the text written before at its start.
+    // Makes room for the length, with the text written before at its start: some of what is there already, or more.
     void Grow(std::size_t written);
+    void Move(std::size_t written);
     Text Taken();
 
     // How far the innermost list has come, from which the room for the rest of it is guessed.
