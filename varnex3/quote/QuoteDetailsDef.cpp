@@ -66,7 +66,7 @@ void QuoteDetailsDef::Read(const XmlSection& section)
     dtEstimatedStartDate = section.TimestampAt("QuoteDetails/EstimatedStartDate", Date());
     dtEstimatedEndDate = section.TimestampAt("QuoteDetails/EstimatedEndDate", Date());
     dExcessToCollect = section.NumberAt("QuoteDetails/ExcessToCollect");
-    section.ReadInto(objOwnersContributionToCollect, "QuoteDetails/OwnersContributionToCollect");
+    section.ReadIntoWhereUsed(objOwnersContributionToCollect, "QuoteDetails/OwnersContributionToCollect");
     sOpenText = section.TextAt("QuoteDetails/OpenText");
     sQuoterName = section.TextAt("QuoteDetails/QuoterName");
 }

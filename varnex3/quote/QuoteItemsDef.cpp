@@ -40,8 +40,10 @@ void QuoteItemsDef::Read(const XmlSection& section)
                   + u" elements are more than the 32768 that one text may have");
 
     items.reserve(items.size() + found.size());
-    for (const xml::Node& node : found)
-        Add()->Read(XmlSection(node, QuoteItem::ClassName)); // what fails stays in the list, as far as it was read
+    for (const xml::Node& node : found) {
+        items.push_back(New<QuoteItem>()); // what fails stays in the list, as far as it was read
+        items.back()->Read(XmlSection(node, QuoteItem::ClassName));
+    }
 }
 
 } // namespace varnex3

@@ -42,8 +42,8 @@ void Xalo_Quote::Read(const XmlSection& section)
     section.ReadInto(objClaimHeaderField, "Xalo_Quote/ClaimHeader");
     sQuoteNoField = section.TextAt("Xalo_Quote/QuoteNo");
     dtQuoteDateField = section.TimestampAt("Xalo_Quote/QuoteDate"); // may be left out by Write
-    section.ReadInto(objVarnexStatusField, "Xalo_Quote/VarnexStatus");
-    section.ReadInto(objInspectionReqestedField, "Xalo_Quote/Inspection"); // not the name that Write writes
+    section.ReadIntoWhereUsed(objVarnexStatusField, "Xalo_Quote/VarnexStatus");
+    section.ReadIntoWhereUsed(objInspectionReqestedField, "Xalo_Quote/Inspection"); // not the name that Write writes
     section.ReadInto(objQuoteDetailsField, "Xalo_Quote/QuoteDetails");
     section.ReadInto(objVehicleField, "Xalo_Quote/Vehicle");
     section.ReadInto(objVehicleDetailsField, "Xalo_Quote/VehicleDetails");
@@ -51,7 +51,7 @@ void Xalo_Quote::Read(const XmlSection& section)
     sDefinesField = section.TextAt("Xalo_Quote/Defines");
     section.ReadInto(objQuoteItemsField, "Xalo_Quote/QuoteItems");
     section.ReadInto(objTotalsField, "Xalo_Quote/Totals");
-    section.ReadInto(objAssessmentField, "Xalo_Quote/Assessment");
+    section.ReadIntoWhereUsed(objAssessmentField, "Xalo_Quote/Assessment");
     section.ReadInto(objCustomerField, "Xalo_Quote/Customer");
     iImageCountField = section.Int16At("Xalo_Quote/ImageCount");
 }
