@@ -12,7 +12,7 @@ namespace {
 
 constexpr std::size_t kAlignment = __STDCPP_DEFAULT_NEW_ALIGNMENT__;
 constexpr std::size_t kLeast = 512;
-constexpr std::size_t kMost = 16 * 1024; // what a single record that lives on may keep from being freed
+constexpr std::size_t kMost = std::size_t{16} * 1024; // what a single record that lives on may keep from being freed
 
 // A block that is being filled counts as used by as many records as it could never hold, so that filling it need not
 // count; what is too much is taken off when it is full.

@@ -58,7 +58,7 @@ void XmlWriter::PutLine(Part... parts)
 // What stands before the line that does not fit is kept.
 void XmlWriter::Grow(std::size_t written)
 {
-    constexpr std::size_t kStep = 8 * 1024; // what is written stays near the processor
+    constexpr std::size_t kStep = std::size_t{8} * 1024; // what is written stays near the processor
     const std::size_t needed = length + kTabs.size();
     if (needed > grown.capacity())
         Move(written);

@@ -21,7 +21,7 @@ class XmlWriter
 {
 public:
     // Characters that are written before any room is allocated. Most messages are shorter.
-    static constexpr std::size_t kUsualRoom = 24 * 1024;
+    static constexpr std::size_t kUsualRoom = std::size_t{24} * 1024;
 
     // The text of a record: what its Write writes, at the level of its class (T::kLevel).
     template <class T>

@@ -43,7 +43,7 @@ private:
 template <QuoteHoursTypeEnum category>
 Ref<QuoteHoursDef> NewHours()
 {
-    const auto hours = New<QuoteHoursDef>();
+    auto hours = New<QuoteHoursDef>();
     hours->Category(category);
     return hours;
 }

@@ -5,6 +5,8 @@
 #include <cstdint>
 #include <string_view>
 
+#include "varnex3/xml/Characters.h"
+
 namespace varnex3::xml {
 
 using NameSet = std::uint64_t;
@@ -20,8 +22,8 @@ constexpr std::uint8_t NameBit(std::basic_string_view<Char> name)
 {
     if (name.empty())
         return 0;
-    const auto first = static_cast<std::size_t>(name.front());
-    const auto last = static_cast<std::size_t>(name.back());
+    const auto first = std::size_t{Unit(name.front())};
+    const auto last = std::size_t{Unit(name.back())};
     return static_cast<std::uint8_t>((name.size() * 9 + first * 25 + last * 30) % bitsOfNames);
 }
 
