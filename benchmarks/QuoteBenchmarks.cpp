@@ -125,6 +125,10 @@ void RegisterGrowth(const std::string& folder, int items)
     const Sample sample = Load(folder, items);
     Register("growth/both" + sample.size,
              [sample] { return Read(sample.utf16)->Serialise().size() > sample.items * 100; });
+    Register("growth/pugixml" + sample.size, [sample] {
+        auto model = ReadWithPugixml(sample.utf8);
+        return WriteWithPugixml(model).size() > sample.items * 100;
+    });
 }
 
 void RegisterMaking()
