@@ -265,9 +265,16 @@ bool Node::IsElement(std::string_view name) const
 
 std::u16string Node::Text() const
 {
-    std::u16string room;
-    const std::u16string_view text = Text(room);
-    return room.empty() ? std::u16string(text) : std::move(room);
+    if (!document)
+        return {};
+    return document->content->Visit([this]<class Char>(const Tree<Char>& tree) -> std::u16string {
+        if constexpr (sizeof(Char) == sizeof(char16_t))
+            if (tree.IsPlainLeaf(index))
+                return std::u16string(tree.Content(index));
+        std::u16string text;
+        tree.AppendText(text, index);
+        return text;
+    });
 }
 
 std::u16string_view Node::Text(std::u16string& room) const

@@ -74,26 +74,34 @@ inline bool CopyAsciiBlock(const char16_t* from, char* to)
     return true;
 }
 
-// Whether characters are ASCII and the same in both widths: eight of them, and four.
-inline bool AreSameAscii(__m128i wide, __m128i narrow)
-{
-    const __m128i isSame = _mm_cmpeq_epi16(wide, _mm_unpacklo_epi8(narrow, _mm_setzero_si128()));
-    return _mm_movemask_epi8(isSame) == 0xFFFF && _mm_movemask_epi8(narrow) == 0;
-}
-
 inline __m128i LoadHalf(const void* p) { return _mm_loadl_epi64(static_cast<const __m128i*>(p)); }
 
-inline bool SameEight(const char16_t* wide, const char* ascii)
-{
-    return AreSameAscii(LoadBlock(wide), LoadHalf(ascii));
-}
-
-inline bool SameFour(const char16_t* wide, const char* ascii)
+inline __m128i LoadQuarter(const char* p)
 {
     int four = 0;
-    std::memcpy(&four, ascii, sizeof(four));
-    return AreSameAscii(LoadHalf(wide), _mm_cvtsi32_si128(four));
+    std::memcpy(&four, p, sizeof(four));
+    return _mm_cvtsi32_si128(four);
 }
+
+// Compares characters of two widths, block by block, with one outcome at the end.
+class AsciiComparison
+{
+public:
+    void Eight(const char16_t* wide, const char* ascii) { Add(LoadBlock(wide), LoadHalf(ascii)); }
+    void Four(const char16_t* wide, const char* ascii) { Add(LoadHalf(wide), LoadQuarter(ascii)); }
+
+    bool IsSameAscii() const { return _mm_movemask_epi8(same) == 0xFFFF && _mm_movemask_epi8(narrows) == 0; }
+
+private:
+    void Add(__m128i wide, __m128i narrow)
+    {
+        same = _mm_and_si128(same, _mm_cmpeq_epi16(wide, _mm_unpacklo_epi8(narrow, _mm_setzero_si128())));
+        narrows = _mm_or_si128(narrows, narrow);
+    }
+
+    __m128i same = _mm_set1_epi8(-1);
+    __m128i narrows = _mm_setzero_si128();
+};
 
 // One bit for each of the sixteen characters that is in the class.
 inline std::uint32_t Bits(__m128i isInClass) { return static_cast<std::uint32_t>(_mm_movemask_epi8(isInClass)); }
@@ -220,13 +228,18 @@ inline bool SameAscii(const char16_t* wide, const char* ascii, std::size_t count
 {
     std::size_t i = 0;
 #ifdef VARNEX3_XML_SSE2
-    for (; i + 8 < count; i += 8)
-        if (!detail::SameEight(wide + i, ascii + i))
-            return false;
-    if (count >= 8)
-        return detail::SameEight(wide + count - 8, ascii + count - 8);
-    if (count >= 4)
-        return detail::SameFour(wide, ascii) && detail::SameFour(wide + count - 4, ascii + count - 4);
+    detail::AsciiComparison comparison;
+    if (count >= 8) {
+        for (; i + 8 < count; i += 8)
+            comparison.Eight(wide + i, ascii + i);
+        comparison.Eight(wide + count - 8, ascii + count - 8);
+        return comparison.IsSameAscii();
+    }
+    if (count >= 4) {
+        comparison.Four(wide, ascii);
+        comparison.Four(wide + count - 4, ascii + count - 4);
+        return comparison.IsSameAscii();
+    }
 #endif
     while (i < count && wide[i] == Unit(ascii[i]) && Unit(ascii[i]) < 0x80)
         ++i;
