@@ -69,12 +69,12 @@ std::vector<OwnValue> ReadOwnValues(const xml::Document& document)
     const xml::Node message = document.DocumentElement();
     std::vector<OwnValue> values;
     for (const Name element : kOwnElements)
-        if (const xml::Node node = message.FirstChildElement(element))
+        if (const xml::Node node = message.SelectSingle(element))
             values.push_back({element, node.Text(), WhyNotRead(message, element)});
     for (const auto& [section, element] : kInvoiceDates)
-        if (const xml::Node node = message.FirstChildElement(section).FirstChildElement(element))
+        if (const xml::Node node = message.SelectSingle(section).SelectSingle(element))
             values.push_back({element, node.Text(), {}});
-    const xml::Node inspection = message.FirstChildElement(kInspection);
+    const xml::Node inspection = message.SelectSingle(kInspection);
     if (message.IsElement(kQuote) && inspection.AttributeCount() > 0)
         values.push_back({kInspection, inspection.AttributeAt(0).value, {}});
     return values;

@@ -2,6 +2,7 @@
 
 #include <algorithm>
 #include <iterator>
+#include <ranges>
 
 #include "varnex3/varnex3.h"
 
@@ -73,7 +74,7 @@ void ReadByRows(Record& record, const xml::Node& node)
     for (const Member& member : record.Class().members) {
         if (!member.IsProperty() || !member.IsWritable())
             continue;
-        if (const xml::Node value = node.FirstChildElement(member.name)) // a flag says yes by being there
+        if (const xml::Node value = node.SelectSingle(member.name)) // a flag says yes by being there
             Put(record, member.name, member.type.kind == Kind::Boolean ? Variant(true) : Variant(value.Text()));
     }
 }
@@ -98,13 +99,12 @@ std::vector<Section> ReadSections(const xml::Document& document)
     const xml::Node root = document.DocumentElement();
     std::vector<Section> sections;
     for (const SectionClass& entry : kClasses) {
-        xml::Node node = root.FirstChildElement(entry.element);
-        if (!node || ClassFor(root, entry.element) != &entry)
+        const xml::NodeList nodes = root.Select(entry.element);
+        if (nodes.empty() || ClassFor(root, entry.element) != &entry)
             continue;
         Section& section = sections.emplace_back(Section{entry.element, entry.create(), {}, entry.isEvery});
-        do
+        for (const xml::Node& node : nodes | std::views::take(entry.isEvery ? nodes.size() : 1))
             ReadInto(section, node);
-        while (entry.isEvery && (node = node.NextSiblingElement(entry.element)));
     }
     return sections;
 }

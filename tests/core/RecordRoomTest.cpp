@@ -10,6 +10,10 @@
 #include "varnex3/core/CustomerDef.h"
 #include "varnex3/core/VersionDef.h"
 
+#ifdef __SANITIZE_ADDRESS__
+#include <sanitizer/asan_interface.h>
+#endif
+
 using namespace varnex3;
 
 namespace {
@@ -99,3 +103,17 @@ TEST_CASE("RecordRoom: records of one room may end on several threads, and other
     });
     CHECK(wrong == 0);
 }
+
+#ifdef __SANITIZE_ADDRESS__
+TEST_CASE("RecordRoom: the address sanitizer sees that a record has ended whose block has not")
+{
+    const RecordRoom room(1000);
+    const auto before = NewVersion(1);
+    auto ended = NewVersion(2);
+    const Record* const address = ended.get();
+    CHECK_FALSE(__asan_address_is_poisoned(address));
+    ended = {};
+    CHECK(__asan_address_is_poisoned(address));
+    CHECK_FALSE(__asan_address_is_poisoned(before.get()));
+}
+#endif

@@ -359,7 +359,7 @@ void NumberText::PutPair(std::uint64_t value)
         return pairs;
     }();
     start -= 2;
-    std::ranges::copy(kPairs[value], room.begin() + static_cast<std::ptrdiff_t>(start));
+    std::ranges::copy(kPairs[static_cast<std::size_t>(value)], room.begin() + static_cast<std::ptrdiff_t>(start));
 }
 
 Text FormatAmount(double amount)

@@ -58,7 +58,7 @@ public:
     std::unique_ptr<Attachment>& Attached() noexcept { return attachment; }
 
     static void* operator new(std::size_t size) { return RecordRoom::Allocate(size); }
-    static void operator delete(void* memory) noexcept { RecordRoom::Free(memory); }
+    static void operator delete(void* memory, std::size_t size) noexcept { RecordRoom::Free(memory, size); }
 
 protected:
     Record() = default;

@@ -6,6 +6,10 @@
 #include <new>
 #include <utility>
 
+#ifdef __SANITIZE_ADDRESS__
+#include <sanitizer/asan_interface.h>
+#endif
+
 namespace varnex3 {
 
 namespace {
@@ -51,8 +55,11 @@ void* RecordRoom::Allocate(std::size_t size)
     return innermost ? innermost->Take(size) : Place(::operator new(sizeof(Header) + size), nullptr);
 }
 
-void RecordRoom::Free(void* memory) noexcept
+void RecordRoom::Free(void* memory, [[maybe_unused]] std::size_t size) noexcept
 {
+#ifdef __SANITIZE_ADDRESS__
+    __asan_poison_memory_region(memory, size); // the block may live on: who uses the record is found all the same
+#endif
     Header* const header = static_cast<Header*>(memory) - 1;
     header->block ? Drop(header->block, 1) : ::operator delete(header);
 }

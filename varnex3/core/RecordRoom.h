@@ -20,7 +20,7 @@ public:
 
     // Memory for one record: in the thread's room, or by itself where there is none. For Record alone.
     static void* Allocate(std::size_t size);
-    static void Free(void* memory) noexcept;
+    static void Free(void* memory, std::size_t size) noexcept;
 
 private:
     struct Block;
