@@ -20,6 +20,9 @@ set(CMAKE_FIND_ROOT_PATH_MODE_PACKAGE ONLY)
 set(CMAKE_EXE_LINKER_FLAGS_INIT "-static")
 set(CMAKE_SHARED_LINKER_FLAGS_INIT "-static")
 add_compile_definitions(UNICODE _UNICODE _WIN32_WINNT=0x0601 NOMINMAX WIN32_LEAN_AND_MEAN)
+# The cold parts of functions stay where they are: apart, one that turns out empty has the address of another one's, and
+# what tells how to unwind the stack is then the wrong one's, so that an error ends the host.
+add_compile_options(-fno-reorder-blocks-and-partition)
 if(VARNEX3_MINGW STREQUAL i686) # the same arithmetic as everywhere: doubles have 64 bits, not 80
     add_compile_options(-msse2 -mfpmath=sse)
 endif()

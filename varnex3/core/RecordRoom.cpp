@@ -14,7 +14,7 @@ namespace varnex3 {
 
 namespace {
 
-constexpr std::size_t kAlignment = __STDCPP_DEFAULT_NEW_ALIGNMENT__;
+constexpr std::size_t kAlignment = RecordRoom::kAlignment;
 constexpr std::size_t kLeast = 512;
 constexpr std::size_t kMost = std::size_t{16} * 1024; // what a single record that lives on may keep from being freed
 
@@ -22,7 +22,14 @@ constexpr std::size_t kMost = std::size_t{16} * 1024; // what a single record th
 // count; what is too much is taken off when it is full.
 constexpr std::int32_t kOpen = std::numeric_limits<std::int32_t>::max();
 
+#ifdef _WIN32
+RecordRoom* Innermost() { return nullptr; }
+void Enter(RecordRoom*) {}
+#else
 thread_local constinit RecordRoom* innermost = nullptr;
+RecordRoom* Innermost() { return innermost; }
+void Enter(RecordRoom* room) { innermost = room; }
+#endif
 
 constexpr std::size_t Aligned(std::size_t size) { return (size + kAlignment - 1) / kAlignment * kAlignment; }
 
@@ -40,19 +47,21 @@ struct alignas(kAlignment) RecordRoom::Header
     Block* block;
 };
 
-RecordRoom::RecordRoom(std::size_t expected)
-    : blockSize(std::clamp(expected, kLeast, kMost)), outer(std::exchange(innermost, this))
-{}
+RecordRoom::RecordRoom(std::size_t expected) : blockSize(std::clamp(expected, kLeast, kMost)), outer(Innermost())
+{
+    Enter(this);
+}
 
 RecordRoom::~RecordRoom()
 {
     Close();
-    innermost = outer;
+    Enter(outer);
 }
 
 void* RecordRoom::Allocate(std::size_t size)
 {
-    return innermost ? innermost->Take(size) : Place(::operator new(sizeof(Header) + size), nullptr);
+    RecordRoom* const room = Innermost();
+    return room ? room->Take(size) : Place(::operator new(sizeof(Header) + size), nullptr);
 }
 
 void RecordRoom::Free(void* memory, [[maybe_unused]] std::size_t size) noexcept

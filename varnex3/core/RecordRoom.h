@@ -9,9 +9,15 @@ namespace varnex3 {
 
 // While a room is there, the records that its thread makes stand in it. They may outlive it, in any order and on any
 // thread: a block is freed with the last of its records. Rooms nest; the innermost one counts.
+//
+// On Windows a room changes nothing, and every record stands by itself: to look up a thread's variable takes as long
+// there as memory does, and leaves a handle behind when a library is unloaded.
 class RecordRoom
 {
 public:
+    // What a record may ask for: no member of a record needs more.
+    static constexpr std::size_t kAlignment = 8;
+
     // What the records are expected to take together, in bytes: little is not to waste a large block.
     explicit RecordRoom(std::size_t expected);
     ~RecordRoom();
