@@ -57,6 +57,7 @@ public:
     // Null until a face needs it; ends with the record.
     std::unique_ptr<Attachment>& Attached() noexcept { return attachment; }
 
+    // NOLINTNEXTLINE(misc-new-delete-overloads,cert-dcl54-cpp): the one below matches it, with the size of the class
     static void* operator new(std::size_t size) { return RecordRoom::Allocate(size); }
     static void operator delete(void* memory, std::size_t size) noexcept { RecordRoom::Free(memory, size); }
 
