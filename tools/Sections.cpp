@@ -2,7 +2,6 @@
 
 #include <algorithm>
 #include <iterator>
-#include <ranges>
 
 #include "varnex3/varnex3.h"
 
@@ -103,8 +102,9 @@ std::vector<Section> ReadSections(const xml::Document& document)
         if (nodes.empty() || ClassFor(root, entry.element) != &entry)
             continue;
         Section& section = sections.emplace_back(Section{entry.element, entry.create(), {}, entry.isEvery});
-        for (const xml::Node& node : nodes | std::views::take(entry.isEvery ? nodes.size() : 1))
-            ReadInto(section, node);
+        const std::size_t count = entry.isEvery ? nodes.size() : 1;
+        for (std::size_t i = 0; i < count; ++i)
+            ReadInto(section, nodes[i]);
     }
     return sections;
 }

@@ -28,7 +28,8 @@ void MakeReadable(Xalo_Error& message)
 {
     if (!IsSet(message.InsurerField()->UnderwriterName()))
         message.InsurerField()->UnderwriterName(u"Insurer");
-    for (std::int16_t i = 0; i < message.ErrorDetailsField()->Count(); ++i)
+    const auto count = static_cast<std::int16_t>(message.ErrorDetailsField()->Count());
+    for (std::int16_t i = 0; i < count; ++i)
         GiveBothNumbers(*message.ErrorDetailsField()->ErrorItems(i)->MessageOrderError());
 }
 

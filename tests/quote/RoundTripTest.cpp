@@ -39,7 +39,8 @@ void MakeReadable(Xalo_Quote& quote)
     if (!IsSet(quote.QuoteDateField()))
         quote.QuoteDateField(Date{38061});
     quote.InspectionReqestedField()->InspectionReason(u"");
-    for (std::int16_t i = 0; i < quote.QuoteItemsField()->Count(); ++i)
+    const auto count = static_cast<std::int16_t>(quote.QuoteItemsField()->Count());
+    for (std::int16_t i = 0; i < count; ++i)
         GivePart(*quote.QuoteItemsField()->QuoteItems(i));
 }
 
