@@ -25,7 +25,7 @@ struct Use
 
 constexpr Use kMostGrowth{64, 0}; // what an allocator may keep for itself; not one byte an object or a call
 
-// The compiler's runtime takes two handles for the thread that it starts in, and never gives them back.
+// The compiler's runtime opens two handles when it is loaded, for 32-bit Windows, and never closes them.
 constexpr long kHandlesOfALoad = 2;
 
 // A new handle gets the lowest number that is free: the numbers below it are in use. (Wine does not count handles.)
