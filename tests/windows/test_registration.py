@@ -100,12 +100,7 @@ class Registration(unittest.TestCase):
 
     @classmethod
     def program(cls, name: str, folder: str) -> pathlib.Path:
-        """A copy of one of a folder's programs: where Wine is a 32-bit program, system32 itself is another folder to it."""
-        copy = cls.folder / folder / name
-        if not copy.exists():
-            copy.parent.mkdir(exist_ok=True)
-            shutil.copy(cls.component.drive / "windows" / folder / name, copy)
-        return copy
+        return cls.component.drive / "windows" / folder / name
 
     @classmethod
     def registry(cls) -> Registry:
