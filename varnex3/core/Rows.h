@@ -19,6 +19,7 @@
 
 #include "varnex3/core/Declarations.h"
 #include "varnex3/core/Enumeration.h"
+#include "varnex3/core/RareText.h"
 #include "varnex3/core/Types.h"
 #include "varnex3/core/XmlSection.h"
 #include "varnex3/core/XmlWriter.h"
@@ -45,6 +46,20 @@ struct Access<T>
     using Value = T;
     using Given = T;
     static Given Give(T member) { return member; }
+};
+template <>
+struct Access<RareText>
+{
+    using Value = Text;
+    using Given = const Text&;
+    static Given Give(const RareText& member) { return member.Held(); }
+};
+template <>
+struct Access<WordText>
+{
+    using Value = Text;
+    using Given = Text;
+    static Given Give(const WordText& member) { return member.Copy(); }
 };
 template <class T, Ref<T> (*Make)()>
 struct Access<Child<T, Make>>

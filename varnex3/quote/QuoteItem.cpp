@@ -11,8 +11,8 @@ namespace {
 struct Kind
 {
     QuoteItemTypeEnum type;
-    TextView code;
-    TextView description;
+    const char16_t* code;
+    const char16_t* description;
 };
 
 // In the order in which they are read. Mechanical work counts as removing and replacing, paint materials and
@@ -53,13 +53,13 @@ const UpdateStatusRow* FindUpdateStatus(TextView word)
 
 } // namespace
 
-Text QuoteItem::ErrorMessage() const { return sErrorMessage; }
+Text QuoteItem::ErrorMessage() const { return sErrorMessage.Held(); }
 
 Text QuoteItem::UpdateStatusCode()
 {
     if (const UpdateStatusRow* const row = FindUpdateStatus(sUpdateStatus))
         sUpdateStatusCode = row->code;
-    return sUpdateStatusCode;
+    return sUpdateStatusCode.Held();
 }
 
 void QuoteItem::UpdateStatusCode(Text value) { sUpdateStatusCode = std::move(value); } // UpdateStatus stays
@@ -146,8 +146,8 @@ void QuoteItem::Become(std::span<const bool> isThere)
         if (!isThere[i])
             continue;
         eQuoteItemType = kKinds[i].type;
-        sQuoteItemTypeString = kKinds[i].code;
-        sTypeDescription = kKinds[i].description;
+        sQuoteItemTypeString.Become(kKinds[i].code);
+        sTypeDescription.Become(kKinds[i].description);
     }
     if (std::ranges::count(isThere, true) > 1)
         sErrorMessage += u",Quote item contain more than one item type."; // the fixed text, comma and all

@@ -46,18 +46,18 @@ class QuoteItem final : public Record
     VARNEX_PROPERTY(Child<QuoteItemMiscellaneous>, objMiscellaneous, Miscellaneous, "The miscellaneous cost.");
     VARNEX_PROPERTY(MechanicalHours, objMechanical, Mechanical, "Hours of mechanical work.");
     VARNEX_PROPERTY(Child<QuoteItemTowing>, objTowing, Towing, "Towing.");
-    VARNEX_PROPERTY(Text, sComment, Comment, "Comment on the item.");
+    VARNEX_PROPERTY(RareText, sComment, Comment, "Comment on the item.");
     VARNEX_PROPERTY(Text, sUpdateStatus, UpdateStatus,
                     "What happened to the item: ACCEPTED, ACKNOWLEDGEDDELETE, ADDED, CHANGED or DELETED, in any letter "
                     "case; written as it is.");
     VARNEX_PROPERTY(bool, bReportOn, ReportOn, "Whether the item is to be reported on; reading never makes it false.");
-    VARNEX_PROPERTY(Text, sDefines, Defines, "Definitions that the item uses.");
+    VARNEX_PROPERTY(RareText, sDefines, Defines, "Definitions that the item uses.");
     VARNEX_PROPERTY(QuoteItemTypeEnum, eQuoteItemType, QuoteItemType,
                     "The kind that is written; none for a number outside the enumeration.");
     VARNEX_READONLY(Text, ErrorMessage,
                     "\",Quote item contain more than one item type.\", once for each reading of several kinds.");
-    VARNEX_PROPERTY(Text, sQuoteItemTypeString, QuoteItemTypeString, "Code of the kind, set by reading.");
-    VARNEX_PROPERTY(Text, sTypeDescription, TypeDescription, "The kind in words, set by reading.");
+    VARNEX_PROPERTY(WordText, sQuoteItemTypeString, QuoteItemTypeString, "Code of the kind, set by reading.");
+    VARNEX_PROPERTY(WordText, sTypeDescription, TypeDescription, "The kind in words, set by reading.");
     VARNEX_ACCESSORS(
         Text, UpdateStatusCode,
         "Code of UpdateStatus: P, K, A, C or D in the order of its words. A code set here shows only while "
@@ -74,8 +74,8 @@ private:
     void WriteKind(XmlWriter& xml) const;
     void Become(std::span<const bool> isThere);
 
-    Text sErrorMessage;
-    Text sUpdateStatusCode;
+    RareText sErrorMessage;
+    RareText sUpdateStatusCode;
     UpdateStatusEnum eUpdateStatusType{};
     VARNEX_RECORD_END;
 };
