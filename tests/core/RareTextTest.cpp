@@ -1,7 +1,6 @@
 #include "varnex3/core/RareText.h"
 
 #include "tests/Printing.h"
-#include "varnex3/quote/QuoteItem.h"
 
 using namespace varnex3;
 
@@ -45,20 +44,4 @@ TEST_CASE("WordText: the empty text takes the place of a word")
     text.Become(u"Repair");
     text = Text();
     CHECK(text.Copy().empty());
-}
-
-TEST_CASE("QuoteItem: a host's own words for the kind hold until a kind is read")
-{
-    const auto item = New<QuoteItem>();
-    item->ParseXML(u"<QuoteItem><ItemNo>1</ItemNo><Repair><Hours>1</Hours></Repair></QuoteItem>");
-    CHECK(item->TypeDescription() == u"Repair");
-    item->TypeDescription(u"");
-    item->QuoteItemTypeString(u"another");
-    CHECK(item->TypeDescription().empty());
-    item->ParseXML(u"<QuoteItem><ItemNo>1</ItemNo></QuoteItem>");
-    CHECK(item->TypeDescription().empty());
-    CHECK(item->QuoteItemTypeString() == u"another");
-    item->ParseXML(u"<QuoteItem><Part></Part></QuoteItem>");
-    CHECK(item->TypeDescription() == u"Part");
-    CHECK(item->QuoteItemTypeString() == u"Part");
 }

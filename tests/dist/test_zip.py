@@ -24,7 +24,6 @@ WIN64 = pathlib.Path(os.environ.get("VARNEX3_WIN64", SOURCE / "build/win64"))
 EXPECTED = SOURCE / "tests/dist/expected"
 COMPILERS = {"win64": "x86_64-w64-mingw32-g++-win32", "win32": "i686-w64-mingw32-g++-win32"}
 WARNINGS = ("-Wall", "-Wextra", "-Werror")
-# Wine starts as a 32-bit process, which sees the 64-bit programs as Sysnative.
 SCRIPT_HOSTS = {"win64": r"C:\windows\system32\cscript.exe", "win32": r"C:\windows\syswow64\cscript.exe"}
 
 sys.path.insert(0, str(SOURCE / "tests/windows"))

@@ -14,7 +14,7 @@ class QuoteItemPaintLabour final : public Record
     VARNEX_PARSEXML(Text, "Reads every value; an absent one is 0 or the empty text.");
     VARNEX_PROPERTY(double, dHours, Hours, "Number of hours.");
     VARNEX_PROPERTY(double, dHourlyRate, HourlyRate, "Dollars for an hour in another paint group.");
-    VARNEX_PROPERTY(RareText, sOtherPaintGroup, OtherPaintGroup, "The paint group that has a rate of its own.");
+    VARNEX_PROPERTY(Text, sOtherPaintGroup, OtherPaintGroup, "The paint group that has a rate of its own.");
 
 public:
     static constexpr int kLevel = 3;
